@@ -1,0 +1,82 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+#include "call/queue_store.hpp"
+
+#include <cstdlib>
+#include <cstring>
+#include <functional>
+
+#include "call/mode_word.hpp"
+
+namespace arbor::lumen::vm::detail {
+namespace {
+
+/// What a SYCL handle is a handle of: its first machine word, the implementation pointer.
+template <typename Handle>
+std::uint64_t identity(const Handle& handle) {
+  static_assert(sizeof(Handle) >= sizeof(std::uint64_t));
+  std::uint64_t word;
+  std::memcpy(&word, static_cast<const void*>(&handle), sizeof word);
+  return word;
+}
+
+}  // namespace
+
+std::uint64_t queue_key(const sycl::queue* queue) {
+  if (queue == nullptr) return 0;
+  const sycl::context context = queue->get_context();
+  const sycl::device device = queue->get_device();
+  return 0x428a2f98d728ae22 * static_cast<std::uint64_t>(std::hash<sycl::queue>{}(*queue)) ^
+         0x2427114e873b90dd * fnv(identity(context)) ^ 0x504f4fa00fc9fb57 * fnv(identity(device));
+}
+
+queue_store& queue_store::instance() {
+  static queue_store store;
+  store.read_verbosity();
+  return store;
+}
+
+// A level of 0 doubles as the mark that nothing was read, so it alone is read again.
+void queue_store::read_verbosity() {
+  if (verbosity_.load(std::memory_order_relaxed) != 0) return;
+  const char* text = std::getenv("ARBORLUMEN_VM_VERBOSE");
+  const bool digit = text != nullptr && *text >= '0' && *text <= '9';
+  verbosity_.store(digit ? *text - '0' : -1, std::memory_order_relaxed);
+}
+
+sycl::event queue_store::default_event() {
+  const std::lock_guard lock(mutex_);
+  if (!default_event_) default_event_.emplace();
+  return *default_event_;
+}
+
+std::uint32_t queue_store::stored_mode(std::uint64_t key) {
+  const std::lock_guard lock(mutex_);
+  const auto entry = modes_.find(key);
+  return entry == modes_.end() ? 0 : entry->second;
+}
+
+std::uint32_t queue_store::merge_mode(std::uint64_t key, std::uint32_t mode) {
+  const std::lock_guard lock(mutex_);
+  const auto entry = modes_.find(key);
+  if (entry == modes_.end()) {
+    modes_.emplace(key, mode_word::merge(enums::default_mode, mode));
+    return 0;
+  }
+  const std::uint32_t before = entry->second;
+  entry->second = mode_word::merge(before, mode);
+  return before;
+}
+
+std::atomic<std::uint32_t>& queue_store::status_word(std::uint64_t key) {
+  const std::lock_guard lock(mutex_);
+  return statuses_.try_emplace(key, 0u).first->second;
+}
+
+void queue_store::record_device_word(std::uint64_t key, std::uint64_t device_word) {
+  const std::lock_guard lock(mutex_);
+  device_words_.insert_or_assign(key, device_word);
+}
+
+}  // namespace arbor::lumen::vm::detail

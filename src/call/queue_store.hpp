@@ -1,0 +1,72 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include <atomic>
+#include <cstddef>
+#include <cstdint>
+#include <mutex>
+#include <optional>
+#include <sycl/sycl.hpp>
+#include <unordered_map>
+
+namespace arbor::lumen::vm::detail {
+
+/// 64-bit FNV-1a of the eight bytes of `value`, lowest byte first.
+constexpr std::uint64_t fnv(std::uint64_t value) {
+  std::uint64_t hash = 0xcbf29ce484222325;
+  for (int byte = 0; byte < 8; ++byte) {
+    hash ^= (value >> (8 * byte)) & 0xff;
+    hash *= 0x100000001b3;
+  }
+  return hash;
+}
+
+/// By what the store knows a queue: its hash, its context and its device. Queues that agree in all
+/// three share one entry, also one after the other. A null queue has key 0.
+std::uint64_t queue_key(const sycl::queue* queue);
+
+/// The process-wide store of per-queue state. Entries are never removed. One mutex guards the maps
+/// and the default event, and is held only around access to them.
+class queue_store {
+ public:
+  static queue_store& instance();
+
+  /// A finished event that all callers share; what a call returns that has nothing to wait for.
+  sycl::event default_event();
+
+  /// The mode word stored for a queue, 0 if there is none.
+  std::uint32_t stored_mode(std::uint64_t key);
+
+  /// Merges `mode` into the stored word, or into the default word if there is none.
+  /// @returns the word stored before, 0 if there was none.
+  std::uint32_t merge_mode(std::uint64_t key, std::uint32_t mode);
+
+  /// The status word of a queue, made at zero if absent. The reference stays valid as long as the
+  /// store lives, so it may be ored into outside the lock.
+  std::atomic<std::uint32_t>& status_word(std::uint64_t key);
+
+  /// Notes what the queue's device was classified as.
+  void record_device_word(std::uint64_t key, std::uint64_t device_word);
+
+ private:
+  queue_store() = default;
+  void read_verbosity();
+
+  struct fnv_hash {
+    std::size_t operator()(std::uint64_t key) const { return fnv(key); }
+  };
+  template <typename V>
+  using map = std::unordered_map<std::uint64_t, V, fnv_hash>;
+  static constexpr std::size_t first_buckets = 8;
+
+  std::mutex mutex_;
+  std::optional<sycl::event> default_event_;
+  map<std::uint32_t> modes_{first_buckets};
+  map<std::atomic<std::uint32_t>> statuses_{first_buckets};
+  map<std::uint64_t> device_words_{first_buckets};
+  std::atomic<std::int32_t> verbosity_{0};
+};
+
+}  // namespace arbor::lumen::vm::detail

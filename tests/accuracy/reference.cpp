@@ -1,0 +1,57 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+#include "reference.hpp"
+
+#include <cmath>
+
+namespace arbor::lumen::accuracy {
+
+namespace {
+
+template <int (*operation)(mpfr_ptr, mpfr_srcptr, mpfr_rnd_t)>
+void of_one(mpfr_t* y, const mpfr_t* x) {
+  operation(y[0], x[0], MPFR_RNDN);
+}
+template <int (*operation)(mpfr_ptr, mpfr_srcptr, mpfr_srcptr, mpfr_rnd_t)>
+void of_two(mpfr_t* y, const mpfr_t* x) {
+  operation(y[0], x[0], x[1], MPFR_RNDN);
+}
+void sine_and_cosine(mpfr_t* y, const mpfr_t* x) { mpfr_sin_cos(y[0], y[1], x[0], MPFR_RNDN); }
+
+// One line per function: name, reference, C library at float and double, ranges at half, float and
+// double. Add a function here, and its functors are measured and held to the limits of their tier.
+const reference all_references[] = {
+    {"acos", of_one<mpfr_acos>, acosf, acos, {{-1, 1}}, {{-1, 1}}, {{-1, 1}}},
+    {"asin", of_one<mpfr_asin>, asinf, asin, {{-1, 1}}, {{-1, 1}}, {{-1, 1}}},
+    {"atan", of_one<mpfr_atan>, atanf, atan, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
+    {"cbrt", of_one<mpfr_cbrt>, cbrtf, cbrt, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
+    {"exp", of_one<mpfr_exp>, expf, exp, {{-18, 12}}, {{-104, 89}}, {{-746, 710}}},
+    {"exp10", of_one<mpfr_exp10>, exp10f, exp10, {{-8, 6}}, {{-46, 39}}, {{-324, 309}}},
+    {"exp2", of_one<mpfr_exp2>, exp2f, exp2, {{-26, 17}}, {{-151, 129}}, {{-1076, 1025}}},
+    {"expm1", of_one<mpfr_expm1>, expm1f, expm1, {{-9, 12}}, {{-20, 89}}, {{-40, 710}}},
+    {"hypot",
+     of_two<mpfr_hypot>,
+     nullptr,
+     nullptr,
+     {{-6e4, 6e4}, {-6e4, 6e4}},
+     {{-1e38, 1e38}, {-1e38, 1e38}},
+     {{-1e300, 1e300}, {-1e300, 1e300}}},
+    {"ln", of_one<mpfr_log>, logf, log, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+    {"log10", of_one<mpfr_log10>, log10f, log10, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+    {"log1p", of_one<mpfr_log1p>, log1pf, log1p, {{-1, 65504}}, {{-1, 3e38}}, {{-1, 1e308}}},
+    {"log2", of_one<mpfr_log2>, log2f, log2, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+    {"sincos", sine_and_cosine, nullptr, nullptr, {{-100, 100}}, {{-1e4, 1e4}}, {{-1e4, 1e4}}},
+    {"sqrt", of_one<mpfr_sqrt>, sqrtf, sqrt, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+};
+
+}  // namespace
+
+const reference* find_reference(std::string_view function) {
+  for (const reference& r : all_references) {
+    if (r.function == function) return &r;
+  }
+  return nullptr;
+}
+
+}  // namespace arbor::lumen::accuracy
