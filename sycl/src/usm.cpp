@@ -2,13 +2,14 @@
 // SPDX-License-Identifier: Apache-2.0
 #include "sycl/usm.hpp"
 
+#include <algorithm>
 #include <atomic>
 #include <bit>
-#include <cstdlib>
 #include <utility>
 
 #include "processor.hpp"
 #include "sycl/detail/testing.hpp"
+#include "usm_blocks.hpp"
 #include "usm_registry.hpp"
 
 namespace sycl {
@@ -41,10 +42,8 @@ void* allocate(std::size_t alignment, std::size_t bytes, usm::alloc kind,
       fails(kind)) {
     return nullptr;
   }
-  void* memory = nullptr;
-  if (posix_memalign(&memory, alignment < cache_line ? cache_line : alignment, bytes) != 0) {
-    return nullptr;
-  }
+  void* const memory = detail::usm_blocks::take(bytes, std::max(alignment, cache_line));
+  if (memory == nullptr) return nullptr;
   detail::usm_registry::insert(memory, {bytes, kind, owner.identity(), std::move(dev)});
   return memory;
 }
@@ -126,10 +125,12 @@ void* malloc(std::size_t bytes, const queue& q, usm::alloc kind, const property_
 
 void free(void* ptr, const context& ctx) {
   if (ptr == nullptr) return;
-  if (!detail::usm_registry::erase(ptr, detail::handle_access::impl(ctx)->identity())) {
+  const std::size_t bytes =
+      detail::usm_registry::erase(ptr, detail::handle_access::impl(ctx)->identity());
+  if (bytes == 0) {
     throw exception(errc::invalid, "the pointer is no allocation of the context");
   }
-  std::free(ptr);
+  detail::usm_blocks::give_back(ptr, bytes);
 }
 void free(void* ptr, const queue& q) { free(ptr, q.get_context()); }
 

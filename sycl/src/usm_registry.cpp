@@ -39,14 +39,15 @@ void insert(const void* base, usm_record record) {
   all.count.store(all.records.size(), std::memory_order_relaxed);
 }
 
-bool erase(const void* base, const void* ctx) {
+std::size_t erase(const void* base, const void* ctx) {
   registry& all = allocations();
   const std::unique_lock lock(all.mutex);
   const auto found = all.records.find(address(base));
-  if (found == all.records.end() || found->second.ctx != ctx) return false;
+  if (found == all.records.end() || found->second.ctx != ctx) return 0;
+  const std::size_t bytes = found->second.bytes;
   all.records.erase(found);
   all.count.store(all.records.size(), std::memory_order_relaxed);
-  return true;
+  return bytes;
 }
 
 std::optional<usm_record> find(const void* ptr) {

@@ -23,8 +23,8 @@ struct usm_record {
 
 namespace usm_registry {
 void insert(const void* base, usm_record record);
-/// False if there is no such allocation in the context.
-bool erase(const void* base, const void* ctx);
+/// Its size; 0 if there is no such allocation in the context.
+std::size_t erase(const void* base, const void* ctx);
 /// The allocation that the pointer points into, without its device's ownership being shared.
 std::optional<usm_record> find(const void* ptr);
 }  // namespace usm_registry

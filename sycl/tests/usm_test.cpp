@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <cstdlib>
 #include <memory>
+#include <random>
 #include <vector>
 
 #include <gtest/gtest.h>
@@ -53,6 +54,40 @@ TEST(Usm, ForeignPointersAreUnknown) {
     }
   }
   sycl::free(usm, q);
+}
+
+TEST(Usm, ReusedMemoryKeepsSizesAlignmentsAndDistinctness) {
+  const sycl::queue q;
+  std::mt19937_64 random(20240917);
+  struct block {
+    unsigned char* start;
+    std::size_t bytes;
+    unsigned char mark;
+  };
+  std::vector<block> live;
+  for (int step = 0; step < 4000; ++step) {
+    if (live.size() < 20 && random() % 2 == 0) {
+      const std::size_t bytes = 1 + random() % (std::size_t{1} << (6 + random() % 18));
+      const std::size_t alignment = std::size_t{64} << (random() % 10);
+      auto* const p = static_cast<unsigned char*>(
+          sycl::aligned_alloc(alignment, bytes, q, kinds[random() % 3]));
+      ASSERT_NE(p, nullptr);
+      ASSERT_EQ(address(p) % alignment, 0u);
+      const auto mark = static_cast<unsigned char>(step);
+      p[0] = p[bytes / 2] = p[bytes - 1] = mark;
+      live.push_back({p, bytes, mark});
+    } else if (!live.empty()) {
+      const std::size_t i = random() % live.size();
+      const block b = live[i];
+      ASSERT_EQ(b.start[0], b.mark);
+      ASSERT_EQ(b.start[b.bytes / 2], b.mark);
+      ASSERT_EQ(b.start[b.bytes - 1], b.mark);
+      sycl::free(b.start, q);
+      EXPECT_EQ(sycl::get_pointer_type(b.start, q.get_context()), alloc::unknown);
+      live.erase(live.begin() + static_cast<std::ptrdiff_t>(i));
+    }
+  }
+  for (const block& b : live) sycl::free(b.start, q);
 }
 
 TEST(Usm, AllocatesInEveryForm) {
