@@ -39,7 +39,7 @@ class FunctorAccuracy : public ::testing::TestWithParam<functor> {
   void expect_within_limit(const sampling& samples) {
     const functor& f = GetParam();
     const subject s = subject_of(f);
-    const measurement m = measure(s, *find_reference(f.function), samples);
+    const measurement m = measure({&s, 1}, *find_reference(f.function), samples).front();
     std::ostringstream report;
     write_report(report, s, samples, m);
     EXPECT_GT(m.count, 0u);

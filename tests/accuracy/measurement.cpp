@@ -110,52 +110,75 @@ void measurement::add(double error) {
   ++histogram[static_cast<std::size_t>(bin)];
 }
 
-measurement measure(const subject& s, const reference& r, const sampling& samples) {
+void measurement::add(const measurement& other) {
+  if (other.largest > largest || count == 0) {
+    largest = other.largest;
+    worst_argument = other.worst_argument;
+    worst_result = other.worst_result;
+    worst_output = other.worst_output;
+    worst_exact = other.worst_exact;
+  }
+  count += other.count;
+  sum += other.sum;
+  for (std::size_t i = 0; i < histogram.size(); ++i) histogram[i] += other.histogram[i];
+}
+
+std::vector<measurement> measure(std::span<const subject> subjects, const reference& r,
+                                 const sampling& samples) {
   constexpr std::size_t block = 1024;
-  const number_format& format = *s.format;
+  const subject& form = subjects.front();
+  const number_format& format = *form.format;
   std::vector<source> sources;
-  for (std::size_t k = 0; k < s.inputs; ++k)
+  for (std::size_t k = 0; k < form.inputs; ++k)
     sources.emplace_back(format, samples.ranges.at(k), samples, k);
-  std::array<std::vector<char>, 2> in_storage, out_storage;
-  for (auto* storage : {&in_storage, &out_storage}) {
-    for (auto& array : *storage) array.resize(block * format.size);
+  std::array<std::vector<char>, 2> in_storage;
+  std::vector<std::array<std::vector<char>, 2>> out_storage(subjects.size());
+  for (auto& array : in_storage) array.resize(block * format.size);
+  for (auto& arrays : out_storage) {
+    for (auto& array : arrays) array.resize(block * format.size);
   }
   const void* in[] = {in_storage[0].data(), in_storage[1].data()};
-  void* out[] = {out_storage[0].data(), out_storage[1].data()};
 
   ulp_error error_of(format);
   mpfr_pair operands(64), exact(format.precision + 48);
-  measurement m;
+  std::vector<measurement> measured(subjects.size());
   for (bool more = true; more;) {
     std::size_t n = 0;
     for (; n < block && more; ++n) {
-      for (std::size_t k = 0; k < s.inputs && more; ++k) {
+      for (std::size_t k = 0; k < form.inputs && more; ++k) {
         const auto pattern = sources[k].next();
         more = pattern.has_value();
         if (more) format.store(in_storage[k].data(), n, *pattern);
       }
       if (!more) break;
     }
-    s.run(in, out, n);
+    for (std::size_t s = 0; s < subjects.size(); ++s) {
+      void* out[] = {out_storage[s][0].data(), out_storage[s][1].data()};
+      subjects[s].run(in, out, n);
+    }
     for (std::size_t i = 0; i < n; ++i) {
-      for (std::size_t k = 0; k < s.inputs; ++k)
+      for (std::size_t k = 0; k < form.inputs; ++k)
         mpfr_set_d(operands.numbers[k], format.value(format.load(in[k], i)), MPFR_RNDN);
       r.exact(exact.numbers, operands.numbers);
-      for (std::size_t k = 0; k < s.outputs; ++k) {
-        const std::uint64_t result = format.load(out[k], i);
-        const double error = error_of(format.value(result), exact.numbers[k]);
-        m.add(error);
-        if (std::fabs(error) > m.largest || m.count == 1) {
-          m.largest = std::fabs(error);
-          for (std::size_t j = 0; j < s.inputs; ++j) m.worst_argument[j] = format.load(in[j], i);
-          m.worst_result = result;
-          m.worst_output = k;
-          m.worst_exact = text(exact.numbers[k]);
+      for (std::size_t s = 0; s < subjects.size(); ++s) {
+        measurement& m = measured[s];
+        for (std::size_t k = 0; k < form.outputs; ++k) {
+          const std::uint64_t result = format.load(out_storage[s][k].data(), i);
+          const double error = error_of(format.value(result), exact.numbers[k]);
+          m.add(error);
+          if (std::fabs(error) > m.largest || m.count == 1) {
+            m.largest = std::fabs(error);
+            for (std::size_t j = 0; j < form.inputs; ++j)
+              m.worst_argument[j] = format.load(in[j], i);
+            m.worst_result = result;
+            m.worst_output = k;
+            m.worst_exact = text(exact.numbers[k]);
+          }
         }
       }
     }
   }
-  return m;
+  return measured;
 }
 
 }  // namespace arbor::lumen::accuracy

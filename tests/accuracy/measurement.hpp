@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <functional>
 #include <optional>
+#include <span>
 #include <string>
 #include <vector>
 
@@ -56,8 +57,12 @@ struct measurement {
 
   double mean() const { return count == 0 ? 0 : sum / static_cast<double>(count); }
   void add(double error);
+  /// Takes up what was measured over other arguments.
+  void add(const measurement& other);
 };
 
-measurement measure(const subject& s, const reference& r, const sampling& samples);
+/// Measures subjects of one format and form at the same arguments.
+std::vector<measurement> measure(std::span<const subject> subjects, const reference& r,
+                                 const sampling& samples);
 
 }  // namespace arbor::lumen::accuracy

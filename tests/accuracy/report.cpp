@@ -27,13 +27,6 @@ std::string number(const number_format& format, std::uint64_t p) {
   return print("%.17g", format.value(p)) + " (" + pattern(format, p) + ")";
 }
 
-std::string ranges(const sampling& samples) {
-  std::string text;
-  for (const range& r : samples.ranges)
-    text += print("%s[%g, %g]", text.empty() ? "" : " × ", r.low, r.high);
-  return text;
-}
-
 std::string how(const sampling& samples) {
   if (samples.step == 1) return "every number";
   if (samples.step != 0) return "every " + std::to_string(samples.step) + "th number";
@@ -61,10 +54,17 @@ void write_histogram(std::ostream& out, const measurement& m) {
 
 }  // namespace
 
+std::string interval_text(const sampling& samples) {
+  std::string text;
+  for (const range& r : samples.ranges)
+    text += print("%s[%g, %g]", text.empty() ? "" : " × ", r.low, r.high);
+  return text;
+}
+
 void write_report(std::ostream& out, const subject& s, const sampling& samples,
                   const measurement& m) {
-  out << s.name << " over " << ranges(samples) << ", " << m.count << " results, " << how(samples)
-      << "\n";
+  out << s.name << " over " << interval_text(samples) << ", " << m.count << " results, "
+      << how(samples) << "\n";
   out << print("  largest error %.6g ulp, mean %.6g ulp\n", m.largest, m.mean());
   out << "  at ";
   for (std::size_t k = 0; k < s.inputs; ++k)
@@ -75,13 +75,13 @@ void write_report(std::ostream& out, const subject& s, const sampling& samples,
   write_histogram(out, m);
 }
 
-void write_markdown_row(std::ostream& out, const subject& s, const sampling& samples,
+void write_markdown_row(std::ostream& out, const subject& s, const std::string& arguments,
                         const measurement& m) {
-  out << "| " << s.name << " | " << ranges(samples) << " | " << print("%.4g", m.largest) << " | "
-      << print("%.3g", m.mean()) << " | ";
+  out << "| " << s.name << " | " << arguments << " | " << m.count << " | "
+      << print("%.4g", m.largest) << " | ";
   for (std::size_t k = 0; k < s.inputs; ++k)
     out << (k == 0 ? "" : ", ") << pattern(*s.format, m.worst_argument[k]);
-  out << " |\n";
+  out << " | " << print("%.3g", m.mean()) << " |\n";
 }
 
 }  // namespace arbor::lumen::accuracy

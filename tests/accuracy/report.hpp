@@ -4,6 +4,7 @@
 #pragma once
 
 #include <ostream>
+#include <string>
 
 #include "measurement.hpp"
 
@@ -13,8 +14,10 @@ namespace arbor::lumen::accuracy {
 void write_report(std::ostream& out, const subject& s, const sampling& samples,
                   const measurement& m);
 
-/// A row of the accuracy tables: name, arguments, largest and mean error, argument of the largest.
-void write_markdown_row(std::ostream& out, const subject& s, const sampling& samples,
+/// The intervals of the operands.
+std::string interval_text(const sampling& samples);
+/// A row of a table: name, arguments, their number, largest error and where, mean error.
+void write_markdown_row(std::ostream& out, const subject& s, const std::string& arguments,
                         const measurement& m);
 
 }  // namespace arbor::lumen::accuracy

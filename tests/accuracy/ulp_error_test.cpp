@@ -83,7 +83,7 @@ TEST(Measurement, FindsTheWorstArgument) {
   sampling samples;
   samples.ranges = {{1.49, 1.51}};
   samples.step = 1;
-  const measurement m = measure(wrong, *r, samples);
+  const measurement m = measure({&wrong, 1}, *r, samples).front();
   EXPECT_NEAR(m.largest, 100, 0.5);
   EXPECT_EQ(m.worst_argument[0], 0x3fc00000u);
   EXPECT_LT(m.mean(), 0.5);

@@ -1,0 +1,148 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+/// Every body in the loop of a host kernel, beside SLEEF's functions of 1 and 3.5 ulp and the C
+/// library's vector functions, on one thread, for the instruction set of the compilation.
+///
+/// Names are function/type/implementation/arguments/number of elements.
+
+#include <benchmark/benchmark.h>
+
+#include <set>
+#include <string>
+#include <utility>
+
+#include "arguments.hpp"
+#include "block_loop.hpp"
+#include "peers.hpp"
+#include "scalar/functors.hpp"
+#include "scalar/generated/list.hpp"
+
+namespace {
+
+using bench::interval;
+using bench::special;
+using enum bench::spacing;
+
+constexpr std::int64_t sizes[] = {4096, std::int64_t{1} << 20};
+
+constexpr bench::arguments all_arguments[] = {
+    {"acos", {{linear, -1, 1}}, {{linear, -1, 1}}},
+    {"asin", {{linear, -1, 1}}, {{linear, -1, 1}}},
+    {"atan", {{linear, -10, 10}}, {{linear, -10, 10}}},
+    {"atan2", {{linear, -10, 10}, {linear, -10, 10}}, {{linear, -10, 10}, {linear, -10, 10}}},
+    {"cbrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"cos", {{linear, -100, 100}}, {{linear, -100, 100}}},
+    {"div", {{linear, 1, 1000}, {linear, 1, 1000}}, {{linear, 1, 1000}, {linear, 1, 1000}}},
+    {"exp", {{linear, -80, 80}}, {{linear, -600, 600}}},
+    {"exp10", {{linear, -35, 35}}, {{linear, -300, 300}}},
+    {"exp2", {{linear, -120, 120}}, {{linear, -1000, 1000}}},
+    {"expm1", {{linear, -80, 80}}, {{linear, -600, 600}}},
+    {"hypot",
+     {{linear, -100, 100}, {linear, -100, 100}},
+     {{linear, -100, 100}, {linear, -100, 100}}},
+    {"inv", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"invcbrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"invsqrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"ln", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"log10", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"log1p", {{logarithmic, 1e-6, 1e6}}, {{logarithmic, 1e-12, 1e12}}},
+    {"log2", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"pow",
+     {{logarithmic, .01, 100}, {linear, -15, 15}},
+     {{logarithmic, .01, 100}, {linear, -100, 100}}},
+    {"pow2o3", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"pow3o2", {{logarithmic, 1e-20, 1e20}}, {{logarithmic, 1e-200, 1e200}}},
+    {"powr",
+     {{logarithmic, .01, 100}, {linear, -15, 15}},
+     {{logarithmic, .01, 100}, {linear, -100, 100}}},
+    {"sin", {{linear, -100, 100}}, {{linear, -100, 100}}},
+    {"sqrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
+    {"tan", {{linear, -100, 100}}, {{linear, -100, 100}}},
+};
+
+const bench::arguments* arguments_of(std::string_view function) {
+  for (const bench::arguments& a : all_arguments) {
+    if (a.function == function) return &a;
+  }
+  return nullptr;
+}
+
+template <typename T>
+using array_function = void (*)(const T* const* in, T* y, std::int64_t n);
+
+template <typename T>
+void add_one(const std::string& name, array_function<T> f, const interval* from, special kind,
+             std::int64_t n) {
+  benchmark::RegisterBenchmark((name + "/" + std::to_string(n)).c_str(),
+                               [=](benchmark::State& state) {
+                                 std::vector<T> x = bench::draw<T>(from[0], n, 1);
+                                 bench::make_special(x, kind);
+                                 const std::vector<T> second = bench::draw<T>(from[1], n, 2);
+                                 const T* const in[] = {x.data(), second.data()};
+                                 std::vector<T> y(static_cast<std::size_t>(n));
+                                 for (auto _ : state) {
+                                   f(in, y.data(), n);
+                                   benchmark::ClobberMemory();
+                                 }
+                                 state.SetItemsProcessed(state.iterations() * n);
+                               });
+}
+
+template <typename T>
+void add(std::string_view function, char type, std::string_view implementation,
+         array_function<T> f) {
+  const bench::arguments* const from = arguments_of(function);
+  if (from == nullptr) return;
+  const interval* const intervals = sizeof(T) == 4 ? from->of_float : from->of_double;
+  const std::string name =
+      std::string(function) + "/" + type + "/" + std::string(implementation) + "/";
+  for (const std::int64_t n : sizes) add_one<T>(name + "ordinary", f, intervals, special::none, n);
+  add_one<T>(name + "tenth_special", f, intervals, special::tenth_special, sizes[0]);
+  add_one<T>(name + "denormal", f, intervals, special::all_denormal, sizes[0]);
+  const bool trigonometric = function == "sin" || function == "cos" || function == "tan";
+  if (trigonometric) {
+    static constexpr interval large_float[] = {{logarithmic, 1e5, 1e38}, {}};
+    static constexpr interval large_double[] = {{logarithmic, 1e10, 1e300}, {}};
+    add_one<T>(name + "large", f, sizeof(T) == 4 ? large_float : large_double, special::none,
+               sizes[0]);
+  }
+}
+
+/// Functors that share a body are timed once, under the label that comes first.
+template <typename F>
+void add_functor(std::string_view function, char type, std::string_view tier,
+                 std::string_view label, std::set<const void*>& timed) {
+  using loop = bench::loop<F>;
+  if constexpr (!std::is_void_v<loop>) {
+    using T = typename loop::element;
+    if constexpr (std::is_same_v<T, float> || std::is_same_v<T, double>) {
+      const auto key = reinterpret_cast<const void*>(&loop::run);
+      if (!timed.insert(key).second) return;
+      add<T>(function, type, std::string(tier) + "_" + std::string(label), &loop::run);
+    }
+  }
+}
+
+void add_all() {
+  std::set<const void*> timed;
+#define LUMEN_ADD(function, shape, type, tier, label, name) \
+  add_functor<bench::scalar::name>(#function, #type[0], #tier, #label, timed);
+  LUMEN_FUNCTORS(LUMEN_ADD)
+#undef LUMEN_ADD
+  for (const bench::peer& p : bench::peers()) {
+    if (p.run_float != nullptr) add<float>(p.function, p.type, p.implementation, p.run_float);
+    if (p.run_double != nullptr) add<double>(p.function, p.type, p.implementation, p.run_double);
+  }
+}
+
+}  // namespace
+
+int main(int argc, char** argv) {
+  benchmark::Initialize(&argc, argv);
+  if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 2;
+  add_all();
+  benchmark::RunSpecifiedBenchmarks();
+  benchmark::Shutdown();
+  return 0;
+}
