@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <ostream>
 #include <span>
 #include <string_view>
 
@@ -26,6 +27,9 @@ struct functor {
   std::size_t outputs() const { return shape == "v12" ? 2 : 1; }
   bool is_real() const { return type == 'h' || type == 's' || type == 'd'; }
 };
+
+/// How GoogleTest names one.
+inline void PrintTo(const functor& f, std::ostream* out) { *out << f.name; }
 
 /// All of them, in the catalogue's order.
 std::span<const functor> functors();

@@ -6,7 +6,6 @@
 
 #include <gtest/gtest.h>
 
-#include <ostream>
 #include <sstream>
 #include <vector>
 
@@ -17,8 +16,6 @@
 #include "report.hpp"
 
 namespace arbor::lumen::accuracy {
-
-void PrintTo(const functor& f, std::ostream* out) { *out << f.name; }
 
 namespace {
 

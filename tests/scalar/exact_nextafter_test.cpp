@@ -2,6 +2,7 @@
 // SPDX-License-Identifier: Apache-2.0
 
 #include <cmath>
+#include <cstdlib>
 
 #include "bits.hpp"
 #include "scalar/exact/nextafter.hpp"
@@ -95,6 +96,58 @@ TYPED_TEST(ExactNextafter, RandomPairs) {
     const U denormal = x & (named<U>::sign | (named<U>::smallest_normal - 1));
     ASSERT_TRUE(expect_as_in_c<TypeParam>(denormal, source.any()));
   }
+}
+
+/// Where a half stands among all of them, from -infinity to +infinity, both zeros in one place.
+int place_of(std::uint16_t p) { return (p & 0x8000) != 0 ? -(p & 0x7fff) : p; }
+
+/// The neighbour by its place, for numbers and infinities.
+void expect_next_half(std::uint16_t x, std::uint16_t y) {
+  const scalar::binary16 a{x}, b{y};
+  scalar::binary16 r{0x5aa5};
+  const std::uint32_t status = scalar::nextafter_h::call(&a, &b, &r);
+  const int from = place_of(x), to = place_of(y);
+  if (from == to) {
+    ASSERT_EQ(r.pattern, y);
+    ASSERT_EQ(status, 0u);
+    return;
+  }
+  const int next = from < to ? from + 1 : from - 1;
+  ASSERT_EQ(place_of(r.pattern), next) << x << " " << y;
+  if (next == 0) {
+    ASSERT_EQ(r.pattern & 0x8000, x & 0x8000);
+  }
+  const int magnitude = std::abs(next);
+  ASSERT_EQ(status, magnitude < 0x0400 ? underflow : (magnitude == 0x7c00 ? overflow : 0u));
+}
+
+TEST(ExactNextafterHalf, EveryHalfTowardsNotableOnes) {
+  const std::uint16_t targets[] = {0x0000, 0x8000, 0x0001, 0x8001, 0x0400, 0x3c00,
+                                   0xbc00, 0x7bff, 0xfbff, 0x7c00, 0xfc00};
+  for (std::uint32_t p = 0; p < 0x10000; ++p) {
+    if ((p & 0x7fff) > 0x7c00) continue;
+    const auto x = static_cast<std::uint16_t>(p);
+    for (const std::uint16_t y : targets) ASSERT_NO_FATAL_FAILURE(expect_next_half(x, y));
+    for (const int near : {-1, 0, 1}) {
+      const auto y = static_cast<std::uint16_t>(p + static_cast<std::uint32_t>(near));
+      if ((y & 0x7fff) <= 0x7c00) {
+        ASSERT_NO_FATAL_FAILURE(expect_next_half(x, y));
+      }
+    }
+  }
+}
+
+TEST(ExactNextafterHalf, NaNs) {
+  const auto next = [](std::uint16_t x, std::uint16_t y) {
+    const scalar::binary16 a{x}, b{y};
+    scalar::binary16 r{0x5aa5};
+    EXPECT_EQ(scalar::nextafter_h::call(&a, &b, &r), 0u);
+    return r.pattern;
+  };
+  EXPECT_EQ(next(0x7e00, 0x3c00), 0x7e00);
+  EXPECT_EQ(next(0x3c00, 0x7e01), 0x7e01);
+  EXPECT_EQ(next(0x7c01, 0x0000) & 0x7e00, 0x7e00);
+  EXPECT_EQ(next(0x7c00, 0xfe00) & 0x7e00, 0x7e00);
 }
 
 }  // namespace

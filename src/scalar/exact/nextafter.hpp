@@ -5,6 +5,7 @@
 
 #include <cstdint>
 
+#include "scalar/half.hpp"
 #include "scalar/protocol.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
@@ -76,5 +77,38 @@ struct nextafter_body : scalar_v21<nextafter_body<T>, T> {
 
 using nextafter_s = nextafter_body<float>;
 using nextafter_d = nextafter_body<double>;
+
+/// nextafter, half: the same on patterns of 16 bits, with the same codes.
+struct nextafter_h {
+  using input_type = binary16;
+  using output_type = binary16;
+  template <half_element Element>
+  LUMEN_DEVICE static inline std::uint32_t call(const Element* a, const Element* b, Element* r) {
+    const result next =
+        step(std::bit_cast<binary16>(*a).pattern, std::bit_cast<binary16>(*b).pattern);
+    *r = std::bit_cast<Element>(binary16{static_cast<std::uint16_t>(next.pattern)});
+    return mask(next.status);
+  }
+
+ private:
+  struct result {
+    std::uint32_t pattern;
+    code status;
+  };
+
+  LUMEN_DEVICE static result step(std::uint32_t x, std::uint32_t y) {
+    const std::uint32_t x_magnitude = x & 0x7fffu;
+    const std::uint32_t y_magnitude = y & 0x7fffu;
+    if (x_magnitude > 0x7c00u || y_magnitude > 0x7c00u)
+      return {half_pattern(half_value(x) + half_value(y)), code::none};
+    if (x == y || (x_magnitude | y_magnitude) == 0) return {y, code::none};
+    if (x_magnitude == 0) return {(y & 0x8000u) | 1u, code::underflow};
+    const bool inwards = ((x ^ y) & 0x8000u) != 0 || x_magnitude > y_magnitude;
+    const std::uint32_t next = inwards ? x - 1 : x + 1;
+    const std::uint32_t magnitude = next & 0x7fffu;
+    if (magnitude < 0x0400u) return {next, code::underflow};
+    return {next, magnitude > 0x7bffu ? code::overflow : code::none};
+  }
+};
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
