@@ -13,13 +13,14 @@
 #include <utility>
 
 #include "arguments.hpp"
-#include "block_loop.hpp"
 #include "peers.hpp"
+#include "scalar/block_loop.hpp"
 #include "scalar/functors.hpp"
 #include "scalar/generated/list.hpp"
 
 namespace {
 
+namespace scalar = arbor::lumen::vm::detail::gpu::norvane::scalar;
 using bench::interval;
 using bench::special;
 using enum bench::spacing;
@@ -110,16 +111,25 @@ void add(std::string_view function, char type, std::string_view implementation,
 }
 
 /// Functors that share a body are timed once, under the label that comes first.
+template <typename Loop, typename T>
+void run_loop(const T* const* in, T* y, std::int64_t n) {
+  if constexpr (Loop::inputs == 1)
+    Loop::run(n, {in[0]}, {y});
+  else
+    Loop::run(n, {in[0], in[1]}, {y});
+}
+
 template <typename F>
 void add_functor(std::string_view function, char type, std::string_view tier,
                  std::string_view label, std::set<const void*>& timed) {
-  using loop = bench::loop<F>;
+  using loop = scalar::block_loop_of<F>;
   if constexpr (!std::is_void_v<loop>) {
-    using T = typename loop::element;
-    if constexpr (std::is_same_v<T, float> || std::is_same_v<T, double>) {
-      const auto key = reinterpret_cast<const void*>(&loop::run);
-      if (!timed.insert(key).second) return;
-      add<T>(function, type, std::string(tier) + "_" + std::string(label), &loop::run);
+    using T = typename loop::input_type;
+    if constexpr (loop::outputs == 1 && std::is_same_v<T, typename loop::output_type> &&
+                  (std::is_same_v<T, float> || std::is_same_v<T, double>)) {
+      const array_function<T> run = &run_loop<loop, T>;
+      if (!timed.insert(reinterpret_cast<const void*>(run)).second) return;
+      add<T>(function, type, std::string(tier) + "_" + std::string(label), run);
     }
   }
 }
@@ -127,7 +137,7 @@ void add_functor(std::string_view function, char type, std::string_view tier,
 void add_all() {
   std::set<const void*> timed;
 #define LUMEN_ADD(function, shape, type, tier, label, name) \
-  add_functor<bench::scalar::name>(#function, #type[0], #tier, #label, timed);
+  add_functor<scalar::name>(#function, #type[0], #tier, #label, timed);
   LUMEN_FUNCTORS(LUMEN_ADD)
 #undef LUMEN_ADD
   for (const bench::peer& p : bench::peers()) {

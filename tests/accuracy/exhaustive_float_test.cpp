@@ -37,7 +37,7 @@ TEST_P(EveryFloat, IsWithinTheLimitOfTheTier) {
   for (const functor& f : functors()) {
     if (f.function != GetParam() || f.type != 's') continue;
     tested.push_back(f);
-    subjects.push_back(subject_of(f));
+    subjects.push_back(loop_subject_of(f));
   }
   const auto measured = measure_every_float(subjects, *find_reference(GetParam()));
   for (std::size_t k = 0; k < tested.size(); ++k) {

@@ -9,6 +9,7 @@
 #include <cmath>
 #include <cstdint>
 #include <cstring>
+#include <iterator>
 #include <limits>
 #include <mutex>
 #include <string>
@@ -21,21 +22,24 @@ namespace {
 constexpr std::size_t block = 8192;
 constexpr std::uint64_t floats = std::uint64_t{1} << 32;
 
-/// The error of a float in ulp of `exact`; the conventions are those of `ulp_error`.
-double float_error(float result, double exact) {
-  constexpr double infinity = std::numeric_limits<double>::infinity();
-  if (std::isnan(result) || std::isnan(exact))
-    return std::isnan(result) && std::isnan(exact) ? 0 : infinity;
+/// The magnitude of a float's error in ulp of `exact`, without a branch; the conventions are those
+/// of `ulp_error`.
+inline double float_error(float result, double exact) {
   constexpr double behind = 0x1p128, to_round = 0x1.ffffffp127;
-  const bool overflows = std::fabs(exact) >= to_round;
-  if (std::isinf(result) && overflows && (result < 0) == (exact < 0)) return 0;
-  const double r = std::isinf(result) ? std::copysign(behind, result) : double(result);
-  const double e = overflows ? std::copysign(behind, exact) : exact;
-  const auto field = static_cast<int>((std::bit_cast<std::uint64_t>(e) >> 52) & 0x7ff) - 1023;
-  const int exponent = std::clamp(field, -126, 127);
-  const double scale =
-      std::bit_cast<double>(static_cast<std::uint64_t>(1023 + 23 - exponent) << 52);
-  return (r - e) * scale;
+  const double magnitude = std::fabs(exact);
+  const double r = static_cast<double>(result);
+  const double near_r = std::fabs(r) > behind ? std::copysign(behind, r) : r;
+  const double near_e = magnitude >= to_round ? std::copysign(behind, exact) : exact;
+  double binade = magnitude < 0x1p-126 ? 0x1p-126 : magnitude;
+  binade = binade >= behind ? 0x1p127 : binade;
+  // 2^23 over the power of two below.
+  const std::uint64_t scale = (std::uint64_t{2 * 1023 + 23} << 52) -
+                              (std::bit_cast<std::uint64_t>(binade) & 0x7ff0000000000000u);
+  const double error = std::fabs((near_r - near_e) * std::bit_cast<double>(scale));
+  const bool result_is_nan = result != result, exact_is_nan = exact != exact;
+  const double of_nans =
+      result_is_nan == exact_is_nan ? 0 : std::numeric_limits<double>::infinity();
+  return result_is_nan | exact_is_nan ? of_nans : error;
 }
 
 /// The walk of one thread.
@@ -73,17 +77,19 @@ class walk {
 
  private:
   measurement errors(const std::vector<float>& results, std::uint32_t first) const {
+    std::vector<double> error(block);
+    double sum = 0;
+    for (std::size_t i = 0; i < block; ++i) error[i] = float_error(results[i], exact_[i]);
+    for (std::size_t i = 0; i < block; ++i) sum += error[i];
+    const auto worst = static_cast<std::size_t>(
+        std::distance(error.begin(), std::max_element(error.begin(), error.end())));
     measurement m;
-    for (std::size_t i = 0; i < block; ++i) {
-      const double error = std::fabs(float_error(results[i], exact_[i]));
-      m.add(error);
-      if (error > m.largest) {
-        m.largest = error;
-        m.worst_argument[0] = first + i;
-        m.worst_result = std::bit_cast<std::uint32_t>(results[i]);
-        m.worst_exact = std::to_string(exact_[i]);
-      }
-    }
+    m.count = block;
+    m.sum = sum;
+    m.largest = error[worst];
+    m.worst_argument[0] = first + worst;
+    m.worst_result = std::bit_cast<std::uint32_t>(results[worst]);
+    m.worst_exact = std::to_string(exact_[worst]);
     return m;
   }
 

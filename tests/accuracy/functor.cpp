@@ -3,6 +3,7 @@
 
 #include "functor.hpp"
 
+#include "scalar/block_loop.hpp"
 #include "scalar/functors.hpp"
 #include "scalar/generated/list.hpp"
 
@@ -33,9 +34,36 @@ void run(const void* const* in, void* const* out, std::uint32_t* status, std::si
   }
 }
 
+template <typename Loop>
+void run_loop(const void* const* in, void* const* out, std::size_t n) {
+  using T = typename Loop::input_type;
+  using U = typename Loop::output_type;
+  const T* a[Loop::inputs];
+  U* y[Loop::outputs];
+  for (int k = 0; k < Loop::inputs; ++k) a[k] = static_cast<const T*>(in[k]);
+  for (int k = 0; k < Loop::outputs; ++k) y[k] = static_cast<U*>(out[k]);
+  Loop::run(static_cast<std::int64_t>(n), a, y);
+}
+
+template <typename F>
+constexpr decltype(functor::run_loop) loop_of() {
+  using loop = scalar::block_loop_of<F>;
+  if constexpr (std::is_void_v<loop>)
+    return nullptr;
+  else
+    return &run_loop<loop>;
+}
+
 constexpr functor all_functors[] = {
 #define LUMEN_ROW(function, form, type, tier, label, name) \
-  {#name, #function, #form, #type[0], #tier, #label, &run<scalar::name, shape::form>},
+  {#name,                                                  \
+   #function,                                              \
+   #form,                                                  \
+   #type[0],                                               \
+   #tier,                                                  \
+   #label,                                                 \
+   &run<scalar::name, shape::form>,                        \
+   loop_of<scalar::name>()},
     LUMEN_FUNCTORS(LUMEN_ROW)
 #undef LUMEN_ROW
 };

@@ -22,6 +22,8 @@ struct functor {
   std::string_view tier;
   std::string_view label;
   void (*run)(const void* const* in, void* const* out, std::uint32_t* status, std::size_t n);
+  /// The same by the vectorised loop of host kernels, without status; null where there is none.
+  void (*run_loop)(const void* const* in, void* const* out, std::size_t n);
 
   std::size_t inputs() const { return shape == "v11" || shape == "v12" ? 1 : 2; }
   std::size_t outputs() const { return shape == "v12" ? 2 : 1; }

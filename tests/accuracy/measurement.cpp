@@ -90,6 +90,12 @@ subject subject_of(const functor& f) {
           }};
 }
 
+subject loop_subject_of(const functor& f) {
+  subject s = subject_of(f);
+  if (f.run_loop != nullptr) s.run = f.run_loop;
+  return s;
+}
+
 std::optional<subject> c_library_subject(const reference& r, char type) {
   if (type == 's' && r.c_float != nullptr)
     return of_c_function("C library, float", r.c_float, float_format);

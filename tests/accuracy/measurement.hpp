@@ -37,7 +37,10 @@ struct subject {
   std::function<void(const void* const* in, void* const* out, std::size_t n)> run;
 };
 
+/// By the functor's call, element by element.
 subject subject_of(const functor& f);
+/// By the vectorised loop where there is one.
+subject loop_subject_of(const functor& f);
 /// The C library's function of that element type, if it has one.
 std::optional<subject> c_library_subject(const reference& r, char type);
 

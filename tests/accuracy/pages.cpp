@@ -78,7 +78,7 @@ void write_type(std::ostream& out, const std::string& function, char type, const
   const reference& r = *find_reference(function);
   std::vector<subject> subjects;
   for (const functor& f : functors()) {
-    if (f.function == function && f.type == type) subjects.push_back(subject_of(f));
+    if (f.function == function && f.type == type) subjects.push_back(loop_subject_of(f));
   }
   if (subjects.empty()) return;
   if (const auto c = c_library_subject(r, type)) subjects.push_back(*c);

@@ -1,0 +1,156 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+/// Bodies over whole arrays on a processor: the main path vectorised over blocks of 512 bytes, the
+/// rare path only for the flagged elements of blocks that hold any. Results are those of the
+/// functor's `call`, element by element.
+#pragma once
+
+#include <algorithm>
+#include <cstdint>
+#include <type_traits>
+
+#include "scalar/protocol.hpp"
+
+namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
+
+/// How many vectors of a body are in flight at once: four hide the latency of the chains of fma,
+/// unless the body says that so many do not fit into the registers.
+template <typename Body>
+constexpr int interleave() {
+  if constexpr (requires { Body::interleave; }) return Body::interleave;
+  return 4;
+}
+
+#if defined(__clang__)
+#define LUMEN_BLOCK_LOOP _Pragma("clang loop interleave_count(in_flight)")
+#else
+#define LUMEN_BLOCK_LOOP
+#endif
+
+/// Of one or two inputs and one or two outputs.
+template <typename Body, typename T, typename U, int Inputs, int Outputs>
+class block_loop {
+ public:
+  using input_type = T;
+  using output_type = U;
+  static constexpr int inputs = Inputs;
+  static constexpr int outputs = Outputs;
+  static constexpr std::int64_t length = 512 / std::max(sizeof(T), sizeof(U));
+
+  /// Computes `n` elements of whole arrays. An output may be the same array as an input.
+  static void run(std::int64_t n, const T* const (&in)[Inputs], U* const (&out)[Outputs]) {
+    std::int64_t first = 0;
+    if (are_apart(n, in, out)) {
+      for (; n - first >= length; first += length)
+        block(in[0] + first, second(in, first), out[0] + first, second(out, first));
+    }
+    for (; first < n; first += length) copied_block(first, std::min(length, n - first), in, out);
+  }
+
+ private:
+  using flag = typename rare_flag<U>::type;
+
+  /// The second array from its element `first` on; null where there is one array.
+  template <typename E, int N>
+  static E* second([[maybe_unused]] E* const (&arrays)[N], [[maybe_unused]] std::int64_t first) {
+    if constexpr (N == 2)
+      return arrays[1] + first;
+    else
+      return nullptr;
+  }
+
+  [[gnu::always_inline]] static inline auto main(const T* a, [[maybe_unused]] const T* b,
+                                                 std::int64_t i) {
+    if constexpr (Inputs == 1)
+      return Body::main(load(a + i));
+    else
+      return Body::main(load(a + i), load(b + i));
+  }
+
+  /// The rare path, where the body has one.
+  static void rare(const T* a, [[maybe_unused]] const T* b, U* y, [[maybe_unused]] U* z,
+                   std::int64_t i) {
+    const T x = load(a + i);
+    if constexpr (Inputs == 2) {
+      if constexpr (requires { Body::rare(x, x, y); }) Body::rare(x, load(b + i), y + i);
+    } else if constexpr (Outputs == 2) {
+      if constexpr (requires { Body::rare(x, y, z); }) Body::rare(x, y + i, z + i);
+    } else {
+      if constexpr (requires { Body::rare(x, y); }) Body::rare(x, y + i);
+    }
+  }
+
+  /// `b` and `z` are null where there is one input, or one output.
+  [[gnu::always_inline]] static inline void block(const T* __restrict a, const T* __restrict b,
+                                                  U* __restrict y,
+                                                  [[maybe_unused]] U* __restrict z) {
+    [[maybe_unused]] constexpr int in_flight = interleave<Body>();
+    flag flags = 0;
+    LUMEN_BLOCK_LOOP
+    for (std::int64_t i = 0; i < length; ++i) {
+      const auto result = main(a, b, i);
+      if constexpr (Outputs == 1) {
+        store(y + i, result.value);
+      } else {
+        store(y + i, result.first);
+        store(z + i, result.second);
+      }
+      flags |= result.rare;
+    }
+    if (flags != 0) [[unlikely]]
+      repair(a, b, y, z);
+  }
+
+  /// The flags alone, once more, and the rare path where one is set.
+  [[gnu::noinline, gnu::cold]] static void repair(const T* __restrict a, const T* __restrict b,
+                                                  U* __restrict y, U* __restrict z) {
+    flag flags[length];
+    for (std::int64_t i = 0; i < length; ++i) flags[i] = main(a, b, i).rare;
+    for (std::int64_t i = 0; i < length; ++i) {
+      if (flags[i] != 0) rare(a, b, y, z, i);
+    }
+  }
+
+  /// Fewer elements than a block, or an output over an input: through local blocks. What a short
+  /// block lacks is filled with its first element.
+  static void copied_block(std::int64_t first, std::int64_t count, const T* const (&in)[Inputs],
+                           U* const (&out)[Outputs]) {
+    T a[Inputs][length] = {};
+    U y[Outputs][length];
+    for (int k = 0; k < Inputs; ++k) {
+      std::copy_n(in[k] + first, count, a[k]);
+      std::fill(a[k] + count, a[k] + length, a[k][0]);
+    }
+    block(a[0], Inputs == 2 ? a[Inputs - 1] : nullptr, y[0],
+          Outputs == 2 ? y[Outputs - 1] : nullptr);
+    for (int k = 0; k < Outputs; ++k) std::copy_n(y[k], count, out[k] + first);
+  }
+
+  static bool are_apart(std::int64_t n, const T* const (&in)[Inputs], U* const (&out)[Outputs]) {
+    const auto begin = [](const auto* p) { return reinterpret_cast<std::uintptr_t>(p); };
+    bool apart = true;
+    for (const T* a : in) {
+      for (const U* y : out)
+        apart = apart && (begin(a + n) <= begin(y) || begin(y + n) <= begin(a));
+    }
+    return apart;
+  }
+};
+
+/// The loop of a functor, by the base of its body, so that functors with one body share a loop;
+/// void for one that has no main path of this form.
+template <typename Body, typename T, typename U>
+block_loop<Body, T, U, 1, 1> block_loop_by_base(const scalar_v11<Body, T, U>*);
+template <typename Body, typename T, typename U>
+block_loop<Body, T, U, 1, 2> block_loop_by_base(const scalar_v12<Body, T, U>*);
+template <typename Body, typename T, typename U>
+block_loop<Body, T, U, 2, 1> block_loop_by_base(const scalar_v21<Body, T, U>*);
+template <typename Body, typename T, typename U>
+block_loop<Body, T, U, 2, 1> block_loop_by_base(const scalar_v21c<Body, T, U>*);
+void block_loop_by_base(...);
+
+template <typename Functor>
+using block_loop_of = decltype(block_loop_by_base(static_cast<const Functor*>(nullptr)));
+
+}  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
