@@ -7,7 +7,6 @@
 
 #include <mpfr.h>
 
-#include <optional>
 #include <span>
 #include <string_view>
 #include <vector>
@@ -29,8 +28,6 @@ struct reference {
   double (*c_double)(double) = nullptr;  ///< within 2 ulp of double: 2^-28 ulp of float
   /// Where results are neither trivial nor infinite, by element type and operand.
   std::vector<range> half_ranges, float_ranges, double_ranges;
-  /// Of functions of one operand, where errors peak: a third of all random arguments lies there.
-  std::optional<range> narrow = {};
 
   const std::vector<range>& ranges(char type) const {
     return type == 'h' ? half_ranges : (type == 's' ? float_ranges : double_ranges);
