@@ -38,13 +38,13 @@ table inverse_turn_words() {
   return t;
 }
 
-/// cos x = head + rest with a power of two as the head, sin x = high + low with a low part
-/// truncated to 24 bits.
+/// cos x = head + rest with a power of two as the head, sin x = high + low with a low part of 24
+/// bits.
 struct sine_and_cosine {
   std::uint64_t head, rest, high, low;
 
   /// At a multiple of 2 pi/steps; the multiples of a quarter turn are exact.
-  static sine_and_cosine at(int step, int steps) {
+  static sine_and_cosine at(int step, int steps, mpfr_rnd_t low_rounding) {
     const real x = real::ratio(2 * step, steps) * real::pi();
     const bool integer = 4 * step % steps == 0;
     const int quadrant = 4 * step / steps;
@@ -54,36 +54,35 @@ struct sine_and_cosine {
     const real head = nearest_power_of_two(cosine);
     const real high(sine.to_double());
     return {head.double_word(), (cosine - head).double_word(), high.double_word(),
-            (sine - high).rounded_to(24, MPFR_RNDZ).double_word()};
+            (sine - high).rounded_to(24, low_rounding).double_word()};
   }
 };
 
 table rows_of_512() {
   table t{
       "internal_dsin_la_data_ha",
-      "Row j = 0..511, t = 2 pi j/512: (D, H, S, T) with H + D = cos t, H the nearest power of\n"
-      "two or 0, and S + T = sin t, T of 24 bits; exact to 2^-76. The cosine of t is the sine\n"
-      "128 rows on.",
+      "Row j = 0..511, t = 2 pi j/512: (D, H, S, T) with H + D = cos t to 2^-55, H the nearest\n"
+      "power of two or 0, and S + T = sin t to 2^-77, T truncated to 24 bits. The cosine of t is\n"
+      "the sine 128 rows on.",
       64,
       4,
       {}};
   for (int j = 0; j < 512; ++j) {
-    const auto a = sine_and_cosine::at(j, 512);
+    const auto a = sine_and_cosine::at(j, 512, MPFR_RNDZ);
     t.words.insert(t.words.end(), {a.rest, a.head, a.high, a.low});
   }
   return t;
 }
 
 table rows_of_64() {
-  table t{
-      "__dsin_ep_CoutTab",
-      "Row j = 0..63, t = 2 pi j/64: cos t less its head, sin t in two words, the second one of\n"
-      "24 bits, and the head, the nearest power of two or 0.",
-      64,
-      4,
-      {}};
+  table t{"__dsin_ep_CoutTab",
+          "Row j = 0..63, t = 2 pi j/64: cos t less its head, sin t in two words, the second one\n"
+          "rounded to 24 bits, and the head, the nearest power of two or 0.",
+          64,
+          4,
+          {}};
   for (int j = 0; j < 64; ++j) {
-    const auto a = sine_and_cosine::at(j, 64);
+    const auto a = sine_and_cosine::at(j, 64, MPFR_RNDN);
     t.words.insert(t.words.end(), {a.rest, a.high, a.low, a.head});
   }
   return t;

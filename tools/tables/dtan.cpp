@@ -14,8 +14,8 @@ table tangents() {
       "internal_dtan_ha_data",
       "The first six words are constants of the reduction: 16/pi, the shifter, pi/16 in three\n"
       "words, and the largest argument of the main path. Word 6 + k, k = 0..15, is the tangent\n"
-      "of k pi/16, and word 22 + k what it leaves out; that of 0 is -0, and the pole is the\n"
-      "largest negative double less half its unit, which is -2^1024.",
+      "of k pi/16, and word 22 + k what it leaves out; that of 0 is -0, and for the pole stands\n"
+      "-2^1024 in two words.",
       64,
       2,
       {0x40145f306dc9c883, 0x4338000000000000, 0x3fc921fb54442d18, 0x3c61a62633000000,
