@@ -1,0 +1,78 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+#pragma once
+
+#include <cstdint>
+
+#include "scalar/half.hpp"
+#include "scalar/horner.hpp"
+#include "scalar/protocol.hpp"
+#include "scalar/trig/fixed_turn.hpp"
+#include "scalar/trig/half_turn_cosine.hpp"
+
+namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
+
+/// sincos, float: sine, then cosine, from the place in the turn in fixed point and the rest to the
+/// nearest quarter turn. Code 1 for infinities; in both results their NaN, as that of NaNs, is the
+/// argument's pattern made quiet.
+///
+/// `la` and `ep` are one body: degree 7 and 8 in one word. `ha` has the terms of degree 0 to 2 in
+/// two words. Largest error SCSLA and SCSHA ulp.
+template <tier t>
+struct sincos_s : scalar_v12<sincos_s<t>, float> {
+  LUMEN_MAIN main_result2<float> main(float x) {
+    const pair of_range = of_place(fixed_turn(x), x);
+    const bool below = is_below_fixed_turn(x);
+    return {select(below, x, of_range.sine), select(below, 1.0f, of_range.cosine),
+            flag_if<float>(is_above_fixed_turn(x))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(float x, float* sine, float* cosine) {
+    if (is_special(x)) {
+      const std::uint32_t status = of_special(x, sine);
+      *cosine = *sine;
+      return status;
+    }
+    const pair y = of_place(fixed_turn_by_table(x), x);
+    *sine = y.sine;
+    *cosine = y.cosine;
+    return mask(code::none);
+  }
+
+ private:
+  struct pair {
+    float sine;
+    float cosine;
+  };
+
+  LUMEN_MAIN pair of_place(std::uint64_t place, float x) {
+    const auto quarters = static_cast<std::uint32_t>(place >> 32) + 0x20000000u;
+    const bool swapped = (quarters & 0x40000000u) != 0;
+    const pair kernels = of_rest(rest_of_turn<2>(place));
+    const float sine = value(bits(kernels.sine) ^ ((quarters ^ (quarters << 1)) & 0x80000000u));
+    const float cosine = value(bits(kernels.cosine) ^ (quarters & 0x80000000u));
+    const float first = select(swapped, cosine, sine);
+    return {value(bits(first) ^ sign_bit(x)), select(swapped, sine, cosine)};
+  }
+
+  LUMEN_MAIN pair of_rest(const turn_rest& a) {
+    if constexpr (t == tier::ha) {
+      const float_float v = square(a);
+      const float_float cosine = cosine_of_half_turns(v);
+      const float p = horner(v.high, 0xbf16c981u, 0x40232f49u, 0xc0a55dddu);
+      const float_float c = horner_step({p, 0.0f}, v, value(0x40490fdbu), value(0xb3d195e9u));
+      const float_float sine = times_rest(c, a);
+      return {sine.high + sine.low, cosine.high + cosine.low};
+    } else {
+      const float v = a.u * a.u;
+      const float p = horner(v, 0xbf16c981u, 0x40232f49u, 0xc0a55dddu, 0x40490fdbu);
+      const float q = horner(v, 0x3e6ce1b2u, 0xbfaae2beu, 0x4081e0eeu, 0xc09de9e6u, 0x3f800000u);
+      return {p * a.u, q};
+    }
+  }
+};
+
+using sincos_h = half_v12<sincos_s<tier::ep>>;
+
+}  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
