@@ -9,6 +9,10 @@
 #include "scalar/protocol.hpp"
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
+#include "scalar/trig/octants.hpp"
+#include "scalar/trig/quarter_turn.hpp"
+#include "scalar/trig/quarter_turn_kernels.hpp"
+#include "scalar/trig/turn_rows.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
@@ -50,6 +54,80 @@ struct cos_s<tier::ha> : scalar_v11<cos_s<tier::ha>, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_cosine(x, y); }
+};
+
+/// cos, double. Code 1 for infinities.
+///
+/// `la` and `ep`: the sine of what pi/2 - x leaves to the nearest multiple of pi, with pi in three
+/// and two parts, degree 15 and 9. Where pi/2 - |x| is beyond 2^23, `la` goes on with rows of
+/// tables, within 0.51 ulp, and `ep` with the expansion of 4/pi in doubles. Largest error COSDLA
+/// and COSDEP ulp.
+template <tier t>
+struct cos_d : scalar_v11<cos_d<t>, double> {
+  LUMEN_MAIN main_result<double> main(double x) {
+    const auto next = rest_of_quarter_turn_next < t == tier::la ? 3 : 2 > (fabs(x));
+    const double r = next.rest;
+    const double z = r * r;
+    const double y = fma(polynomial(z) * z, r, r);
+    return {one_if_hidden(next, y),
+            flag_if<double>(!(fabs(next.quarter) <= value(0x4160000000000000u)))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(double x, double* y) {
+    if (is_special(x)) return product_of_special(x, y);
+    if constexpr (t == tier::la) {
+      *y = sine_of_step(turn_step::nearest(x), 128);
+    } else {
+      *y = sine_of_octants(x, 16);
+    }
+    return mask(code::none);
+  }
+
+ private:
+  LUMEN_MAIN double polynomial(double z) {
+    if constexpr (t == tier::la) {
+      return horner(z, 0xbd69f0d60811aac8u, 0x3de60e6857a2f220u, 0xbe5ae63546002231u,
+                    0x3ec71de38030fea0u, 0xbf2a01a019a5b87bu, 0x3f8111111110a4a8u,
+                    0xbfc55555555554a7u);
+    } else {
+      return horner(z, 0x3ec5d4567512bbd5u, 0xbf29f67d9395d587u, 0x3f8110ea968a0185u,
+                    0xbfc55554ad3eaf1fu);
+    }
+  }
+};
+
+/// `ha`: the nearest quarter turn in two words, degree 13 and 14. From 2^20 the same kernels behind
+/// a reduction in fixed point. The NaN of an infinity is the negative one, and a NaN loses its
+/// sign. Largest error COSDHA ulp.
+template <>
+struct cos_d<tier::ha> : scalar_v11<cos_d<tier::ha>, double> {
+  LUMEN_MAIN main_result<double> main(double x) {
+    const double a = fabs(x);
+    const auto s = short_quarter_turn::of(a);
+    const double r = s.rest;
+    const double z = r * r;
+    const bool even = (s.quarters & 1u) == 0;
+    const double q = quarter_turn_series::of_either(even, z) * z;
+    const double y =
+        select(even, cosine_kernel(r, s.rest_low, z, q), sine_kernel(r, s.rest_low, q));
+    return {value(bits(y) ^ sign(s.quarters)), flag_if<double>(is_beyond_short_quarter_turns(a))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(double x, double* y) {
+    if (is_special(x)) return quiet_of_special(x, y);
+    const auto s = quarter_turn::nearest(fabs(x));
+    const bool even = (s.quarters & 1u) == 0;
+    const double result =
+        even ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
+    *y = value(bits(result) ^ sign(s.quarters));
+    return mask(code::none);
+  }
+
+ private:
+  /// Negative in the second and third quadrant.
+  LUMEN_MAIN std::uint64_t sign(std::uint64_t quarters) {
+    return ((quarters ^ (quarters >> 1)) << 63);
+  }
 };
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

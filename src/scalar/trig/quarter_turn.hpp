@@ -1,13 +1,11 @@
 // SPDX-FileCopyrightText: The Arbor Lumen authors
 // SPDX-License-Identifier: Apache-2.0
 
-/// The reductions of doubles to the nearest quarter turn, and the kernels of sine and cosine that
-/// follow.
+/// The reduction of doubles of every size to the nearest quarter turn, in fixed point.
 #pragma once
 
 #include <cstdint>
 
-#include "scalar/horner.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/tables/dsin.hpp"
 
@@ -18,9 +16,6 @@ struct quarter_turn {
   std::uint64_t quarters;  ///< modulo 4
   double rest;
   double rest_low;
-
-  /// The largest argument of the main paths that reduce to quarter turns: below 2^20.
-  LUMEN_MAIN bool is_beyond_short(double a) { return !(a <= value(0x412fffffffffffffu)); }
 
   /// For finite a >= 0 of every size: the 53 bits of a by those 192 bits of 1/(2 pi) that matter,
   /// normalised and multiplied by pi/4 in fixed point. The relative error is below 2^-62. Arguments

@@ -9,6 +9,10 @@
 #include "scalar/protocol.hpp"
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
+#include "scalar/trig/octants.hpp"
+#include "scalar/trig/quarter_turn.hpp"
+#include "scalar/trig/quarter_turn_kernels.hpp"
+#include "scalar/trig/turn_rows.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
@@ -49,6 +53,74 @@ struct sin_s<tier::ha> : scalar_v11<sin_s<tier::ha>, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_sine(x, y); }
+};
+
+/// sin, double. Code 1 for infinities.
+///
+/// `la` and `ep`: x - n pi with pi in three and two parts, degree 15 and 9. Beyond 2^24 `la` goes
+/// on with rows of tables, within 0.51 ulp, and `ep` with the expansion of 4/pi in doubles. Largest
+/// error SINDLA and SINDEP ulp.
+template <tier t>
+struct sin_d : scalar_v11<sin_d<t>, double> {
+  LUMEN_MAIN main_result<double> main(double x) {
+    const double a = fabs(x);
+    const double r = rest_of_half_turns < t == tier::la ? 3 : 2 > (a);
+    const double z = r * r;
+    const double y = fma(polynomial(z) * z, r, r);
+    return {value(bits(y) ^ sign_bit(x)), flag_if<double>(!(a <= value(0x4170000000000000u)))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(double x, double* y) {
+    if (is_special(x)) return product_of_special(x, y);
+    if constexpr (t == tier::la) {
+      const double sine = sine_of_step(turn_step::nearest(fabs(x)), 0);
+      *y = value(bits(sine) ^ sign_bit(x));
+    } else {
+      *y = sine_of_octants(x, 0);
+    }
+    return mask(code::none);
+  }
+
+ private:
+  LUMEN_MAIN double polynomial(double z) {
+    if constexpr (t == tier::la) {
+      return horner(z, 0xbd69f1517e9f65f0u, 0x3de60e6bee01d83eu, 0xbe5ae6355aaa4a53u,
+                    0x3ec71de3806add1au, 0xbf2a01a019a659ddu, 0x3f8111111110a573u,
+                    0xbfc55555555554a8u);
+    } else {
+      return horner(z, 0x3ec5d4567512bbd5u, 0xbf29f67d9395d587u, 0x3f8110ea968a0185u,
+                    0xbfc55554ad3eaf1fu);
+    }
+  }
+};
+
+/// `ha`: the nearest quarter turn in two words, degree 13 and 14. From 2^20 the same kernels behind
+/// a reduction in fixed point. The NaN of an infinity is the negative one, and a NaN loses its
+/// sign. Largest error SINDHA ulp.
+template <>
+struct sin_d<tier::ha> : scalar_v11<sin_d<tier::ha>, double> {
+  LUMEN_MAIN main_result<double> main(double x) {
+    const double a = fabs(x);
+    const auto s = short_quarter_turn::of(a);
+    const double r = s.rest;
+    const double z = r * r;
+    const bool odd = (s.quarters & 1u) != 0;
+    const double q = quarter_turn_series::of_either(odd, z) * z;
+    const double y = select(odd, cosine_kernel(r, s.rest_low, z, q), sine_kernel(r, s.rest_low, q));
+    const std::uint64_t sign = ((s.quarters << 62) ^ bits(x)) & format<double>::sign;
+    return {value(bits(y) ^ sign), flag_if<double>(is_beyond_short_quarter_turns(a))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(double x, double* y) {
+    if (is_special(x)) return quiet_of_special(x, y);
+    const auto s = quarter_turn::nearest(fabs(x));
+    const bool odd = (s.quarters & 1u) != 0;
+    const double result =
+        odd ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
+    const std::uint64_t sign = ((s.quarters << 62) ^ bits(x)) & format<double>::sign;
+    *y = value(bits(result) ^ sign);
+    return mask(code::none);
+  }
 };
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
