@@ -26,6 +26,7 @@ const reference all_references[] = {
     {"asin", of_one<mpfr_asin>, asinf, asin, {{-1, 1}}, {{-1, 1}}, {{-1, 1}}},
     {"atan", of_one<mpfr_atan>, atanf, atan, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
     {"cbrt", of_one<mpfr_cbrt>, cbrtf, cbrt, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
+    {"cos", of_one<mpfr_cos>, cosf, cos, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
     {"exp", of_one<mpfr_exp>, expf, exp, {{-18, 12}}, {{-104, 89}}, {{-746, 710}}},
     {"exp10", of_one<mpfr_exp10>, exp10f, exp10, {{-8, 6}}, {{-46, 39}}, {{-324, 309}}},
     {"exp2", of_one<mpfr_exp2>, exp2f, exp2, {{-26, 17}}, {{-151, 129}}, {{-1076, 1025}}},
@@ -41,8 +42,10 @@ const reference all_references[] = {
     {"log10", of_one<mpfr_log10>, log10f, log10, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"log1p", of_one<mpfr_log1p>, log1pf, log1p, {{-1, 65504}}, {{-1, 3e38}}, {{-1, 1e308}}},
     {"log2", of_one<mpfr_log2>, log2f, log2, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
-    {"sincos", sine_and_cosine, nullptr, nullptr, {{-100, 100}}, {{-1e4, 1e4}}, {{-1e4, 1e4}}},
+    {"sin", of_one<mpfr_sin>, sinf, sin, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
+    {"sincos", sine_and_cosine, nullptr, nullptr, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
     {"sqrt", of_one<mpfr_sqrt>, sqrtf, sqrt, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+    {"tan", of_one<mpfr_tan>, tanf, tan, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
 };
 
 }  // namespace

@@ -7,6 +7,7 @@
 
 #include "scalar/horner.hpp"
 #include "scalar/protocol.hpp"
+#include "scalar/trig/half_sine.hpp"
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
 #include "scalar/trig/octants.hpp"
@@ -129,5 +130,8 @@ struct cos_d<tier::ha> : scalar_v11<cos_d<tier::ha>, double> {
     return ((quarters ^ (quarters >> 1)) << 63);
   }
 };
+
+/// cos, half; one body for all tiers, within HALFCOS ulp.
+using cos_h = half_v11<cosine_of_half>;
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

@@ -7,6 +7,7 @@
 
 #include "scalar/horner.hpp"
 #include "scalar/protocol.hpp"
+#include "scalar/trig/half_sine.hpp"
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
 #include "scalar/trig/octants.hpp"
@@ -122,5 +123,8 @@ struct sin_d<tier::ha> : scalar_v11<sin_d<tier::ha>, double> {
     return mask(code::none);
   }
 };
+
+/// sin, half; one body for all tiers, within HALFSIN ulp.
+using sin_h = half_v11<sine_of_half>;
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

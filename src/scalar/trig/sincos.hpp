@@ -10,6 +10,8 @@
 #include "scalar/protocol.hpp"
 #include "scalar/trig/fixed_turn.hpp"
 #include "scalar/trig/half_turn_cosine.hpp"
+#include "scalar/trig/quarter_turn.hpp"
+#include "scalar/trig/quarter_turn_kernels.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
@@ -69,6 +71,77 @@ struct sincos_s : scalar_v12<sincos_s<t>, float> {
       const float p = horner(v, 0xbf16c981u, 0x40232f49u, 0xc0a55dddu, 0x40490fdbu);
       const float q = horner(v, 0x3e6ce1b2u, 0xbfaae2beu, 0x4081e0eeu, 0xc09de9e6u, 0x3f800000u);
       return {p * a.u, q};
+    }
+  }
+};
+
+/// sincos, double: sine, then cosine. x - n pi/2, and a polynomial for each; from 2^20 the same
+/// behind a reduction in fixed point. Code 1 for infinities, the negative NaN in both results; a
+/// NaN loses its sign.
+///
+/// `ha`: the rest in two words, degree 13 and 14, the cosine with the rounding error of its square.
+/// `la`: pi in three parts, the same polynomials in one word. `ep`: pi in two parts, degree 7
+/// and 8. Largest error SCDHA, SCDLA and SCDEP ulp.
+template <tier t>
+struct sincos_d : scalar_v12<sincos_d<t>, double> {
+  LUMEN_MAIN main_result2<double> main(double x) {
+    const double a = fabs(x);
+    const auto s = reduce(a);
+    const pair y = of_quarter(s.quarters, s.rest, s.rest_low, x);
+    return {y.sine, y.cosine, flag_if<double>(is_beyond_short_quarter_turns(a))};
+  }
+
+  LUMEN_RARE std::uint32_t rare(double x, double* sine, double* cosine) {
+    if (is_special(x)) {
+      const std::uint32_t status = quiet_of_special(x, sine);
+      *cosine = *sine;
+      return status;
+    }
+    const auto s = quarter_turn::nearest(fabs(x));
+    const pair y = of_quarter(s.quarters, s.rest, s.rest_low, x);
+    *sine = y.sine;
+    *cosine = y.cosine;
+    return mask(code::none);
+  }
+
+ private:
+  struct pair {
+    double sine;
+    double cosine;
+  };
+
+  LUMEN_MAIN short_quarter_turn reduce(double a) {
+    if constexpr (t == tier::ha) {
+      return short_quarter_turn::by_products(a);
+    } else {
+      return short_quarter_turn::in_one_word < t == tier::la ? 3 : 2 > (a);
+    }
+  }
+
+  LUMEN_MAIN pair of_quarter(std::uint64_t quarters, double r, double low, double x) {
+    const pair kernels = of_rest(r, low);
+    const bool odd = (quarters & 1u) != 0;
+    const double sine = select(odd, kernels.cosine, kernels.sine);
+    const double cosine = select(odd, kernels.sine, kernels.cosine);
+    const std::uint64_t half = quarters << 62;
+    return {value(bits(sine) ^ ((half ^ bits(x)) & format<double>::sign)),
+            value(bits(cosine) ^ ((half ^ (quarters << 63)) & format<double>::sign))};
+  }
+
+  LUMEN_MAIN pair of_rest(double r, double low) {
+    const double z = r * r;
+    if constexpr (t == tier::ha) {
+      return {sine_kernel(r, low, quarter_turn_series::of_sine(z) * z),
+              cosine_kernel(r, low, z, quarter_turn_series::of_cosine(z) * z)};
+    } else if constexpr (t == tier::la) {
+      const double cosine = fma(quarter_turn_series::of_cosine(z), z, -0.5);
+      return {fma(r, quarter_turn_series::of_sine(z) * z, r), fma(cosine, z, 1.0)};
+    } else {
+      const double sine = horner(z, 0xbf299076bb901430u, 0x3f8110630f1a5f72u, 0xbfc55553fe6f4534u,
+                                 0xbe2a670b2f4764e4u);
+      const double cosine = horner(z, 0x3ef9906ffd58bf6du, 0xbf56c078624df59au, 0x3fa55553a875b0c5u,
+                                   0xbfdffffffbdee95eu, 0x3feffffffff97c47u);
+      return {fma(sine, r, r), cosine};
     }
   }
 };
