@@ -47,8 +47,7 @@ LUMEN_MAIN T negated_if_odd(T rest, T shifted) {
   return value(bits(rest) ^ (bits(shifted) << to_sign));
 }
 
-/// a >= 0 as n pi + rest; the absolute error of the rest is below 2^-47 (float, three parts) and
-/// 2^-81 (double, two parts) of n.
+/// a >= 0 as n pi + rest. Two parts leave 2^-48 of pi at float and 2^-105 at double.
 template <int parts, typename T>
 LUMEN_MAIN T rest_of_half_turns(T a) {
   using pi = pi_parts<T>;
@@ -82,7 +81,7 @@ LUMEN_MAIN quarter_turn_next<double> rest_of_quarter_turn_next(double a) {
   return {quarter, negated_if_odd(plus_half_turns<parts>(n, -a), shifted)};
 }
 
-/// The pattern of one, where the quarter turn hides a.
+/// 1 where the quarter turn hides a.
 template <typename T>
 LUMEN_MAIN T one_if_hidden(const quarter_turn_next<T>& a, T cosine) {
   return select(bits(a.quarter) == pi_parts<T>::half, T(1), cosine);

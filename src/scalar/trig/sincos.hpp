@@ -20,7 +20,7 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// argument's pattern made quiet.
 ///
 /// `la` and `ep` are one body: degree 7 and 8 in one word. `ha` has the terms of degree 0 to 2 in
-/// two words. Largest error SCSLA and SCSHA ulp.
+/// two words. Largest error 2.5 and 0.66 ulp.
 template <tier t>
 struct sincos_s : scalar_v12<sincos_s<t>, float> {
   LUMEN_MAIN main_result2<float> main(float x) {
@@ -81,7 +81,8 @@ struct sincos_s : scalar_v12<sincos_s<t>, float> {
 ///
 /// `ha`: the rest in two words, degree 13 and 14, the cosine with the rounding error of its square.
 /// `la`: pi in three parts, the same polynomials in one word. `ep`: pi in two parts, degree 7
-/// and 8. Largest error SCDHA, SCDLA and SCDEP ulp.
+/// and 8. Largest error 0.86, 1.5 and 2.8e7 ulp. The two parts leave 2^-85 of pi: below 2^20 and
+/// closer than n 2^-58 to the n-th zero, the sine or cosine of `ep` has fewer than 26 bits.
 template <tier t>
 struct sincos_d : scalar_v12<sincos_d<t>, double> {
   LUMEN_MAIN main_result2<double> main(double x) {

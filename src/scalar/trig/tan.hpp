@@ -22,8 +22,8 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// multiple of pi/2.
 ///
 /// `la` and `ep`: x - n pi/2 with pi/2 in three and two parts, and a rational function of degree
-/// 3 and 4 or its negative reciprocal. Beyond 8256 a row of a table. Largest error TANSLA and
-/// TANSEP ulp.
+/// 3 and 4 or its negative reciprocal; largest error 3.7 ulp, and at `ep` 45 ulp, but next to
+/// multiples of pi/2 up to 985. Beyond 8256 a row of a table, within 1.5 ulp.
 template <tier t>
 struct tan_s : scalar_v11<tan_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
@@ -62,7 +62,7 @@ struct tan_s : scalar_v11<tan_s<t>, float> {
 };
 
 /// `ha`: fixed point to the nearest quarter turn, then the quotient of sine and cosine, all in two
-/// words. The NaN of an infinity is its pattern made quiet, as of NaNs. Largest error TANSHA ulp.
+/// words. The NaN of an infinity is its pattern made quiet, as of NaNs. Largest error 0.56 ulp.
 template <>
 struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
@@ -105,9 +105,10 @@ struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
 ///
 /// `la` and `ep`: x - n pi/2 with pi/2 in three and two parts, and r/D(r^2) or its negative
 /// reciprocal with D of degree 9 and 4; the quotient from the reciprocal at float by two steps of
-/// Newton's method. From 2^20 a reduction in fixed point and D of degree 10, with a division. The
-/// NaN of an infinity is the negative one, and a NaN loses its sign. Largest error TANDLA and
-/// TANDEP ulp.
+/// Newton's method. Largest error 2.8 and 5.2e7 ulp. The two parts leave 2^-86 of pi/2: closer than
+/// n 2^-59 to a multiple, `ep` has fewer than 26 bits. From 2^20 a reduction in fixed point and D
+/// of degree 10, with a division, within 2.2 ulp. The NaN of an infinity is the negative one, and a
+/// NaN loses its sign.
 template <tier t>
 struct tan_d : scalar_v11<tan_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
@@ -164,7 +165,7 @@ struct tan_d : scalar_v11<tan_d<t>, double> {
 
 /// `ha`: x = n pi/16 + r in two words, and the addition formula in two words with a table of the
 /// tangents of n pi/16. The pole's row has a number so large that the formula gives -1/tan r by
-/// itself. Beyond 65536.003 the same behind rows of 192 bits of 1/(2 pi). Largest error TANDHA ulp.
+/// itself. Beyond 65536.003 the same behind rows of 192 bits of 1/(2 pi). Largest error 0.52 ulp.
 template <>
 struct tan_d<tier::ha> : scalar_v11<tan_d<tier::ha>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
