@@ -2,7 +2,7 @@
 // SPDX-License-Identifier: Apache-2.0
 
 /// The reduction of floats in fixed point, by which every finite float has its place in the turn to
-/// 2^-64, and what the sine, the cosine and the tangent share of what follows.
+/// 2^-51, and what the sine, the cosine and the tangent share of what follows.
 #pragma once
 
 #include <cstdint>
@@ -22,8 +22,8 @@ struct fixed_turn_range {
 LUMEN_MAIN bool is_below_fixed_turn(float x) { return bits(fabs(x)) < fixed_turn_range::lowest; }
 LUMEN_MAIN bool is_above_fixed_turn(float x) { return bits(fabs(x)) >= fixed_turn_range::table; }
 
-/// frac(|x|/(2 pi)) 2^64 for 2^-12 <= |x| < 2^21, from 27 digits of 1/(2 pi) and the following 38.
-/// Defined for all x.
+/// frac(|x|/(2 pi)) 2^64 for 2^-12 <= |x| < 2^21, from 27 digits of 1/(2 pi) and the following 38,
+/// within 2^13. Defined for all x.
 LUMEN_MAIN std::uint64_t fixed_turn(float x) {
   const std::uint64_t e = (bits(x) >> 23) & 0xffu;
   const std::uint64_t m = (bits(x) & format<float>::fraction) | 0x00800000u;
@@ -32,7 +32,8 @@ LUMEN_MAIN std::uint64_t fixed_turn(float x) {
   return high + low;
 }
 
-/// The same from 2^21 to the largest float, from those 160 digits of 1/(2 pi) that matter.
+/// The same from 2^21 to the largest float, within 1, from those 128 digits of 1/(2 pi) that
+/// matter.
 LUMEN_DEVICE inline std::uint64_t fixed_turn_by_table(float x) {
   const auto e = static_cast<std::int32_t>((bits(x) >> 23) & 0xffu);
   const std::uint64_t m = (bits(x) & format<float>::fraction) | 0x00800000u;
@@ -53,7 +54,7 @@ struct turn_rest {
 };
 
 /// Shifted left until it fills 31 bits, then converted. No float has a place so close to a multiple
-/// of the quarter turn that no bit is left to convert.
+/// of the quarter turn that no bit is left to shift.
 template <int removed>
 LUMEN_MAIN turn_rest rest_of_turn(std::uint64_t place) {
   const std::uint32_t top = static_cast<std::uint32_t>(place >> 32) << removed;

@@ -18,7 +18,7 @@ struct quarter_turn {
   double rest_low;
 
   /// For finite a >= 0 of every size: the 53 bits of a by those 192 bits of 1/(2 pi) that matter,
-  /// normalised and multiplied by pi/4 in fixed point. The relative error is below 2^-62. Arguments
+  /// normalised and multiplied by pi/4 in fixed point. The relative error is below 2^-61. Arguments
   /// below 2 are returned.
   LUMEN_DEVICE static quarter_turn nearest(double a) {
     const auto e = static_cast<std::int32_t>(bits(a) >> 52);
