@@ -177,9 +177,9 @@ TEST(TanDouble, PoleOfTheTable) {
 TEST(TanDouble, SixteenthsBehindTheRows) {
   std::vector<std::uint64_t> arguments;
   for (int k = 0; k < 64; ++k) {
-    const double x = (400'000 + k) * 0.09817477042468103;  // pi/32
+    const double x = (700'000 + k) * 0.09817477042468103;  // pi/32
     for (const double rest : {-0.006, -1e-7, 0.0, 1e-7, 0.006})
-      arguments.push_back(std::bit_cast<std::uint64_t>(x + 40'000.0 + rest));
+      arguments.push_back(std::bit_cast<std::uint64_t>(x + rest));
   }
   expect_within<tan_d<tier::ha>>(trig::tangent, arguments, 0.53);
 }

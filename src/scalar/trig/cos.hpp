@@ -11,6 +11,7 @@
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
 #include "scalar/trig/octants.hpp"
+#include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
 #include "scalar/trig/quarter_turn_kernels.hpp"
 #include "scalar/trig/turn_rows.hpp"
@@ -107,7 +108,7 @@ struct cos_d<tier::ha> : scalar_v11<cos_d<tier::ha>, double> {
     const auto s = short_quarter_turn::of(a);
     const double r = s.rest;
     const double z = r * r;
-    const bool even = (s.quarters & 1u) == 0;
+    const bool even = !is_odd(s.quarters);
     const double q = quarter_turn_series::of_either(even, z) * z;
     const double y =
         select(even, cosine_kernel(r, s.rest_low, z, q), sine_kernel(r, s.rest_low, q));
@@ -117,7 +118,7 @@ struct cos_d<tier::ha> : scalar_v11<cos_d<tier::ha>, double> {
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return quiet_of_special(x, y);
     const auto s = quarter_turn::nearest(fabs(x));
-    const bool even = (s.quarters & 1u) == 0;
+    const bool even = !is_odd(s.quarters);
     const double result =
         even ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
     *y = value(bits(result) ^ sign(s.quarters));

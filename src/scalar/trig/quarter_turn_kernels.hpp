@@ -29,9 +29,9 @@ struct quarter_turn_series {
   }
   /// One of them, by selected coefficients.
   LUMEN_MAIN double of_either(bool is_cosine, double z) {
-    double p = value(select(is_cosine, cosine[0], sine[0]));
-    for (int i = 1; i < 6; ++i) p = fma(p, z, value(select(is_cosine, cosine[i], sine[i])));
-    return p;
+    return horner(z, select(is_cosine, cosine[0], sine[0]), select(is_cosine, cosine[1], sine[1]),
+                  select(is_cosine, cosine[2], sine[2]), select(is_cosine, cosine[3], sine[3]),
+                  select(is_cosine, cosine[4], sine[4]), select(is_cosine, cosine[5], sine[5]));
   }
 };
 

@@ -11,6 +11,7 @@
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
 #include "scalar/trig/octants.hpp"
+#include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
 #include "scalar/trig/quarter_turn_kernels.hpp"
 #include "scalar/trig/turn_rows.hpp"
@@ -105,7 +106,7 @@ struct sin_d<tier::ha> : scalar_v11<sin_d<tier::ha>, double> {
     const auto s = short_quarter_turn::of(a);
     const double r = s.rest;
     const double z = r * r;
-    const bool odd = (s.quarters & 1u) != 0;
+    const bool odd = is_odd(s.quarters);
     const double q = quarter_turn_series::of_either(odd, z) * z;
     const double y = select(odd, cosine_kernel(r, s.rest_low, z, q), sine_kernel(r, s.rest_low, q));
     const std::uint64_t sign = ((s.quarters << 62) ^ bits(x)) & format<double>::sign;
@@ -115,7 +116,7 @@ struct sin_d<tier::ha> : scalar_v11<sin_d<tier::ha>, double> {
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return quiet_of_special(x, y);
     const auto s = quarter_turn::nearest(fabs(x));
-    const bool odd = (s.quarters & 1u) != 0;
+    const bool odd = is_odd(s.quarters);
     const double result =
         odd ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
     const std::uint64_t sign = ((s.quarters << 62) ^ bits(x)) & format<double>::sign;

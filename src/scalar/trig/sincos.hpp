@@ -10,6 +10,7 @@
 #include "scalar/protocol.hpp"
 #include "scalar/trig/fixed_turn.hpp"
 #include "scalar/trig/half_turn_cosine.hpp"
+#include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
 #include "scalar/trig/quarter_turn_kernels.hpp"
 
@@ -121,7 +122,7 @@ struct sincos_d : scalar_v12<sincos_d<t>, double> {
 
   LUMEN_MAIN pair of_quarter(std::uint64_t quarters, double r, double low, double x) {
     const pair kernels = of_rest(r, low);
-    const bool odd = (quarters & 1u) != 0;
+    const bool odd = is_odd(quarters);
     const double sine = select(odd, kernels.cosine, kernels.sine);
     const double cosine = select(odd, kernels.sine, kernels.cosine);
     const std::uint64_t half = quarters << 62;

@@ -11,6 +11,7 @@
 #include "scalar/tables/dtan.hpp"
 #include "scalar/trig/fixed_turn.hpp"
 #include "scalar/trig/half_turn_cosine.hpp"
+#include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
 #include "scalar/trig/quarter_turn_kernels.hpp"
 #include "scalar/trig/tangent_rows_s.hpp"
@@ -36,7 +37,7 @@ struct tan_s : scalar_v11<tan_s<t>, float> {
     const float z = r * r;
     const float p = r * fma(value(0xbdc433b4u), z, value(0x3f7ffffcu));
     const float q = horner(z, 0x3c1f336bu, 0xbedbb7abu, 0x3f7ffffcu);
-    const bool odd = (bits(shifted) & 1u) != 0;
+    const bool odd = is_odd(bits(shifted));
     const float y = quotient(select(odd, q, p), select(odd, p, q));
     const std::uint32_t sign = (bits(shifted) << 31) ^ sign_bit(x);
     return {value(bits(y) ^ sign), flag_if<float>(!(a <= value(0x46010000u)))};
@@ -120,7 +121,7 @@ struct tan_d : scalar_v11<tan_d<t>, double> {
     r = fma(n, value(0xbc91a62633000000u), r);
     if constexpr (t == tier::la) r = fma(n, value(0xba945c06e0e68948u), r);
     const double divisor = denominator(r * r);
-    const bool odd = (bits(shifted) & 1u) != 0;
+    const bool odd = is_odd(bits(shifted));
     const double y = fma(select(odd, divisor, r), reciprocal(select(odd, r, divisor)), 0.0);
     const std::uint64_t sign = (bits(shifted) << 63) ^ sign_bit(x);
     return {value(bits(y) ^ sign), flag_if<double>(is_beyond_short_quarter_turns(a))};
@@ -135,7 +136,7 @@ struct tan_d : scalar_v11<tan_d<t>, double> {
                             0xbe8d6b5f16d11bceu, 0xbec228124e270b4cu, 0xbef66a8ed675ceb9u,
                             0xbf2bbd7794a1b07du, 0xbf61566abbff502au, 0xbf96c16c16c16e58u);
     const double divisor = fma(z, fma(z, q, value(0xbfd5555555555555u)), 1.0);
-    const bool odd = (s.quarters & 1u) != 0;
+    const bool odd = is_odd(s.quarters);
     const double quotient = odd ? divide(divisor, r) : divide(r, divisor);
     *y = value(bits(quotient) ^ (s.quarters << 63) ^ sign_bit(x));
     return mask(code::none);
@@ -177,7 +178,7 @@ struct tan_d<tier::ha> : scalar_v11<tan_d<tier::ha>, double> {
     const double r = fma(-n, value(0x3a645c06e0e68948u), t2);
     const double low =
         fma(-n, value(0x3c61a62633000000u), t1 - t2) - fma(n, value(0x3a645c06e0e68948u), r - t2);
-    const double y = of_sixteenth(static_cast<std::int32_t>(bits(shifted) & 15u), r, low);
+    const double y = of_sixteenth(static_cast<std::int64_t>(bits(shifted) & 15u), r, low);
     // The sum with the row's -0 loses the sign of -0.
     return {select(x == 0.0, x, y), flag_if<double>(!(fabs(x) <= value(0x40f000000e4db24cu)))};
   }
@@ -199,7 +200,7 @@ struct tan_d<tier::ha> : scalar_v11<tan_d<tier::ha>, double> {
 
  private:
   /// tan(k pi/16 + r + low).
-  LUMEN_MAIN double of_sixteenth(std::int32_t k, double r, double low) {
+  LUMEN_MAIN double of_sixteenth(std::int64_t k, double r, double low) {
     const double t = value(internal_dtan_ha_data[6 + k]);
     const double t_low = value(internal_dtan_ha_data[22 + k]);
     const double z = r * r;
