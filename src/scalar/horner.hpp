@@ -4,6 +4,7 @@
 #pragma once
 
 #include <concepts>
+#include <cstddef>
 
 #include "scalar/ops.hpp"
 
@@ -16,6 +17,14 @@ template <typename T, std::same_as<uint_of<T>>... Coefficients>
 LUMEN_MAIN T horner(T r, uint_of<T> highest, Coefficients... coefficients) {
   T p = value(highest);
   ((p = fma(p, r, value(coefficients))), ...);
+  return p;
+}
+
+/// The same with the coefficients in an array.
+template <typename T, std::size_t N>
+LUMEN_MAIN T horner_of(T r, const uint_of<T> (&coefficients)[N]) {
+  T p = value(coefficients[0]);
+  for (std::size_t i = 1; i < N; ++i) p = fma(p, r, value(coefficients[i]));
   return p;
 }
 

@@ -17,6 +17,19 @@ template <int (*operation)(mpfr_ptr, mpfr_srcptr, mpfr_srcptr, mpfr_rnd_t)>
 void of_two(mpfr_t* y, const mpfr_t* x) {
   operation(y[0], x[0], x[1], MPFR_RNDN);
 }
+void reciprocal(mpfr_t* y, const mpfr_t* x) { mpfr_ui_div(y[0], 1, x[0], MPFR_RNDN); }
+void reciprocal_cube_root(mpfr_t* y, const mpfr_t* x) {
+  mpfr_cbrt(y[0], x[0], MPFR_RNDN);
+  mpfr_ui_div(y[0], 1, y[0], MPFR_RNDN);
+}
+void two_thirds_power(mpfr_t* y, const mpfr_t* x) {
+  mpfr_cbrt(y[0], x[0], MPFR_RNDN);
+  mpfr_sqr(y[0], y[0], MPFR_RNDN);
+}
+void three_halves_power(mpfr_t* y, const mpfr_t* x) {
+  mpfr_sqrt(y[0], x[0], MPFR_RNDN);
+  mpfr_mul(y[0], y[0], x[0], MPFR_RNDN);
+}
 void sine_and_cosine(mpfr_t* y, const mpfr_t* x) { mpfr_sin_cos(y[0], y[1], x[0], MPFR_RNDN); }
 
 // One line per function: name, reference, C library at float and double, ranges at half, float and
@@ -27,6 +40,13 @@ const reference all_references[] = {
     {"atan", of_one<mpfr_atan>, atanf, atan, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
     {"cbrt", of_one<mpfr_cbrt>, cbrtf, cbrt, {{-6e4, 6e4}}, {{-1e38, 1e38}}, {{-1e300, 1e300}}},
     {"cos", of_one<mpfr_cos>, cosf, cos, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
+    {"div",
+     of_two<mpfr_div>,
+     nullptr,
+     nullptr,
+     {{-6e4, 6e4}, {-6e4, 6e4}},
+     {{-1e38, 1e38}, {-1e38, 1e38}},
+     {{-1e308, 1e308}, {-1e308, 1e308}}},
     {"exp", of_one<mpfr_exp>, expf, exp, {{-18, 12}}, {{-104, 89}}, {{-746, 710}}},
     {"exp10", of_one<mpfr_exp10>, exp10f, exp10, {{-8, 6}}, {{-46, 39}}, {{-324, 309}}},
     {"exp2", of_one<mpfr_exp2>, exp2f, exp2, {{-26, 17}}, {{-151, 129}}, {{-1076, 1025}}},
@@ -38,12 +58,31 @@ const reference all_references[] = {
      {{-6e4, 6e4}, {-6e4, 6e4}},
      {{-1e38, 1e38}, {-1e38, 1e38}},
      {{-1e300, 1e300}, {-1e300, 1e300}}},
+    {"inv", reciprocal, nullptr, nullptr, {{-6e4, 6e4}}, {{-3e38, 3e38}}, {{-1e308, 1e308}}},
+    {"invcbrt",
+     reciprocal_cube_root,
+     nullptr,
+     nullptr,
+     {{-6e4, 6e4}},
+     {{-3e38, 3e38}},
+     {{-1e308, 1e308}}},
+    {"invsqrt", of_one<mpfr_rec_sqrt>, nullptr, nullptr, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"ln", of_one<mpfr_log>, logf, log, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"log10", of_one<mpfr_log10>, log10f, log10, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"log1p", of_one<mpfr_log1p>, log1pf, log1p, {{-1, 65504}}, {{-1, 3e38}}, {{-1, 1e308}}},
     {"log2", of_one<mpfr_log2>, log2f, log2, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"sin", of_one<mpfr_sin>, sinf, sin, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
     {"sincos", sine_and_cosine, nullptr, nullptr, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
+    {"pow2o3",
+     two_thirds_power,
+     nullptr,
+     nullptr,
+     {{-6e4, 6e4}},
+     {{-3e38, 3e38}},
+     {{-1e308, 1e308}}},
+    {"pow3o2", three_halves_power, nullptr, nullptr, {{0, 1600}}, {{0, 5e25}}, {{0, 2e205}}},
+    {"sincos", sine_and_cosine, nullptr, nullptr, {{-100, 100}}, {{-1e4, 1e4}}, {{-1e4, 1e4}}},
+    {"sqr", of_one<mpfr_sqr>, nullptr, nullptr, {{-300, 300}}, {{-2e19, 2e19}}, {{-1e154, 1e154}}},
     {"sqrt", of_one<mpfr_sqrt>, sqrtf, sqrt, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"tan", of_one<mpfr_tan>, tanf, tan, {{-6e4, 6e4}}, {{-2e4, 2e4}}, {{-2e6, 2e6}}},
 };

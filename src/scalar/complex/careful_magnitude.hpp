@@ -9,13 +9,15 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// sqrt(a² + b²) of finite numbers that are not both zero, of any size: within 0.5000001 ulp, and
-/// the correctly rounded denormal where the result is one.
-///
-/// The exponent of the larger is taken out of both, their squares are summed without error, and the
-/// root s of the rounded sum is corrected by half the rest over s: the next term of the series is
-/// below 2^-106 of the result.
-LUMEN_DEVICE inline double careful_magnitude(double a, double b) {
+/// sum·4^exponent, the sum normalized, high part in [1, 8).
+struct scaled_sum {
+  double_double sum;
+  int exponent;
+};
+
+/// a² + b² of finite numbers that are not both zero, of any size: the exponent of the larger is
+/// taken out of both, and their squares are summed without error.
+LUMEN_DEVICE inline scaled_sum scaled_sum_of_squares(double a, double b) {
   const scaled_double sa = scaled_double::of(fabs(a));
   const scaled_double sb = scaled_double::of(fabs(b));
   const bool a_larger = sa.exponent >= sb.exponent;
@@ -28,10 +30,20 @@ LUMEN_DEVICE inline double careful_magnitude(double a, double b) {
   const double_double mm = two_product(larger.significand, larger.significand);
   const double_double nn = two_product(n, n);
   const double_double raw = sum_of_products(mm, nn);
-  const double_double sum = fast_two_sum(raw.high, raw.low);
+  return {fast_two_sum(raw.high, raw.low), larger.exponent};
+}
+
+/// sqrt(a² + b²) of finite numbers that are not both zero, of any size: within 0.5000001 ulp, and
+/// the correctly rounded denormal where the result is one.
+///
+/// The root s of the rounded sum is corrected by half the rest over s: the next term of the series
+/// is below 2^-106 of the result.
+LUMEN_DEVICE inline double careful_magnitude(double a, double b) {
+  const scaled_sum squares = scaled_sum_of_squares(a, b);
+  const double_double sum = squares.sum;
   const double root = sqrt(sum.high);
   const double rest = fma(-root, root, sum.high) + sum.low;
-  return scaled_back(fast_two_sum(root, divide(rest, 2 * root)), larger.exponent);
+  return scaled_back(fast_two_sum(root, divide(rest, 2 * root)), squares.exponent);
 }
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
