@@ -20,7 +20,7 @@ static constexpr std::uint32_t invcbrt_la_polynomial_s[9] = {
     0xbe310ec2,  // -0.17290785908699036
     0x3e638e15,  // 0.22222168743610382
     0xbeaaaa97,  // -0.33333274722099304
-    0x9962862e,  // -1.1711023524405858e-23
+    0x80000000,  // -0.0
 };
 
 /// Highest first: ((1 + g)^(-1/3) - 1)/g for |g| <= 1/65; times g within 2.9e-19.

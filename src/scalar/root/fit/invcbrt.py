@@ -46,8 +46,11 @@ def interpolate(points: list[Decimal], function) -> list[Decimal]:
 
 
 def chebyshev_nodes(limit: Decimal, count: int) -> list[Decimal]:
-    """Nodes in [-limit, limit]; none of them is 0 where `count` is even."""
-    return [limit * Decimal(math.cos((2 * i + 1) * math.pi / (2 * count))) for i in range(count)]
+    """Nodes in [-limit, limit]; 0 is one of them where `count` is odd."""
+    nodes = [limit * Decimal(math.cos((2 * i + 1) * math.pi / (2 * count))) for i in range(count)]
+    if count % 2 == 1:
+        nodes[count // 2] = Decimal(0)
+    return nodes
 
 
 def evaluate(coefficients: list[Decimal], x: Decimal) -> Decimal:
@@ -58,7 +61,7 @@ def evaluate(coefficients: list[Decimal], x: Decimal) -> Decimal:
 
 
 def rounded(coefficients: list[Decimal], code: str) -> list[Decimal]:
-    return [Decimal(struct.unpack(code, struct.pack(code, float(c)))[0]) for c in coefficients]
+    return [Decimal(struct.unpack(code, struct.pack(code, float(c) + 0.0))[0]) for c in coefficients]
 
 
 def pattern(c: Decimal, code: str) -> str:
