@@ -18,6 +18,11 @@ void of_two(mpfr_t* y, const mpfr_t* x) {
   operation(y[0], x[0], x[1], MPFR_RNDN);
 }
 void reciprocal(mpfr_t* y, const mpfr_t* x) { mpfr_ui_div(y[0], 1, x[0], MPFR_RNDN); }
+/// IEEE's rSqrt: the pole at -0 is -infinity.
+void reciprocal_root(mpfr_t* y, const mpfr_t* x) {
+  mpfr_rec_sqrt(y[0], x[0], MPFR_RNDN);
+  if (mpfr_zero_p(x[0])) mpfr_setsign(y[0], y[0], mpfr_signbit(x[0]), MPFR_RNDN);
+}
 void reciprocal_cube_root(mpfr_t* y, const mpfr_t* x) {
   mpfr_cbrt(y[0], x[0], MPFR_RNDN);
   mpfr_ui_div(y[0], 1, y[0], MPFR_RNDN);
@@ -66,7 +71,7 @@ const reference all_references[] = {
      {{-6e4, 6e4}},
      {{-3e38, 3e38}},
      {{-1e308, 1e308}}},
-    {"invsqrt", of_one<mpfr_rec_sqrt>, nullptr, nullptr, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
+    {"invsqrt", reciprocal_root, nullptr, nullptr, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"ln", of_one<mpfr_log>, logf, log, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"log10", of_one<mpfr_log10>, log10f, log10, {{0, 65504}}, {{0, 3e38}}, {{0, 1e308}}},
     {"log1p", of_one<mpfr_log1p>, log1pf, log1p, {{-1, 65504}}, {{-1, 3e38}}, {{-1, 1e308}}},
