@@ -20,12 +20,19 @@ LUMEN_MAIN T horner(T r, uint_of<T> highest, Coefficients... coefficients) {
   return p;
 }
 
-/// The same with the coefficients in an array.
+/// The same with the coefficients in an array. Unrolled by recursion: a loop here would keep GCC
+/// from vectorising the loop around the body.
+template <std::size_t next = 1, typename T, std::size_t N>
+LUMEN_MAIN T horner_from(T p, T r, const uint_of<T> (&coefficients)[N]) {
+  if constexpr (next == N) {
+    return p;
+  } else {
+    return horner_from<next + 1>(fma(p, r, value(coefficients[next])), r, coefficients);
+  }
+}
 template <typename T, std::size_t N>
 LUMEN_MAIN T horner_of(T r, const uint_of<T> (&coefficients)[N]) {
-  T p = value(coefficients[0]);
-  for (std::size_t i = 1; i < N; ++i) p = fma(p, r, value(coefficients[i]));
-  return p;
+  return horner_from(value(coefficients[0]), r, coefficients);
 }
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

@@ -54,8 +54,7 @@ table singles_d() {
 table pairs_d() {
   table t{"internal_dpow2o3_ha_data",
           "Word i = 0..31: -1/c for the middle c of the i-th of 32 intervals of [1, 2). Words\n"
-          "32 + 2(32k + i) and the next, k = 0..2: (2^k c)^(2/3) in two words. From word 224 the\n"
-          "series of (1 + g)^(2/3) from g^8 to g^1.",
+          "32 + 2(32k + i) and the next, k = 0..2: (2^k c)^(2/3) in two words.",
           64,
           4,
           {}};
@@ -63,12 +62,22 @@ table pairs_d() {
   for (int k = 0; k < 3; ++k) {
     for (int i = 0; i < 32; ++i) append_pair(t.words, power_of_row(k, i, 2, 3), 64);
   }
+  return t;
+}
+
+table series_d() {
+  table t{"internal_dpow2o3_ha_series",
+          "The series of ((1 + g)^(2/3) - 1)/g from g^7 to g^0; for |g| <= 1/65 within 3.3e-19 of\n"
+          "(1 + g)^(2/3).",
+          64,
+          4,
+          {}};
   for (const real& c : binomial_series(2, 3, 8)) t.words.push_back(c.double_word());
   return t;
 }
 
 const registration pow2o3("pow2o3", [] {
-  return std::vector<table>{residues_s(), rows_s(), singles_d(), pairs_d()};
+  return std::vector<table>{residues_s(), rows_s(), singles_d(), pairs_d(), series_d()};
 });
 
 }  // namespace

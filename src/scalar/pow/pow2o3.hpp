@@ -93,8 +93,7 @@ LUMEN_MAIN double two_thirds_power_by_row(double x) {
   const auto a = pow2o3_reduction::of(x, internal_dpow2o3_ha_data);
   const double high = value(internal_dpow2o3_ha_data[32 + 2 * a.row]);
   const double low = value(internal_dpow2o3_ha_data[33 + 2 * a.row]);
-  double p = value(internal_dpow2o3_ha_data[224]);
-  for (int j = 1; j < 8; ++j) p = fma(p, a.g, value(internal_dpow2o3_ha_data[224 + j]));
+  const double p = horner_of(a.g, internal_dpow2o3_ha_series);
   const double result = high + fma(high, fma(p, a.g, 0.0), low);
   return fma(result, a.power, 0.0);
 }
