@@ -142,4 +142,9 @@ TEST(Pow2o3Float, RarePathIsThatOfRowsInEveryTier) {
   }
 }
 
+TEST(Pow2o3, PowersOfTwoAreExactAtHa) {
+  expect_exact_powers<pow2o3_s<tier::ha>>(3, 2);
+  expect_exact_powers<pow2o3_d<tier::ha>>(3, 2);
+}
+
 }  // namespace

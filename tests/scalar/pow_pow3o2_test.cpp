@@ -174,4 +174,9 @@ TEST(Pow3o2Double, RarePathServesEveryNormalResult) {
   }
 }
 
+TEST(Pow3o2, PowersOfTwoAreExactAtHa) {
+  expect_exact_powers<pow3o2_s<tier::ha>>(2, 3);
+  expect_exact_powers<pow3o2_d<tier::ha>>(2, 3);
+}
+
 }  // namespace

@@ -167,4 +167,9 @@ TEST(CbrtDouble, OtherTiersHaveNoStatus) {
   }
 }
 
+TEST(Cbrt, PowersOfTwoAreExactAtHa) {
+  expect_exact_powers<cbrt_s<tier::ha>>(3, 1);
+  expect_exact_powers<any_status<cbrt_d<tier::ha>>>(3, 1);
+}
+
 }  // namespace

@@ -123,4 +123,9 @@ TEST(InvcbrtDouble, MainPathIsThatOfNormalNumbers) {
   expect_main_path_of_magnitudes<invcbrt_d<tier::la>>(0x0010000000000000, 0x7fefffffffffffff);
 }
 
+TEST(Invcbrt, PowersOfTwoAreExactAtHa) {
+  expect_exact_powers<invcbrt_s<tier::ha>>(3, -1);
+  expect_exact_powers<invcbrt_d<tier::ha>>(3, -1);
+}
+
 }  // namespace

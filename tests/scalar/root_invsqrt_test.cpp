@@ -155,4 +155,9 @@ TYPED_TEST(InvsqrtOfAnyTier, Specials) {
   expect_quiet_nans<TypeParam>();
 }
 
+TEST(Invsqrt, PowersOfTwoAreExactAtHa) {
+  expect_exact_powers<invsqrt_s<tier::ha>>(2, -1);
+  expect_exact_powers<invsqrt_d<tier::ha>>(2, -1);
+}
+
 }  // namespace

@@ -7,6 +7,7 @@
 #pragma once
 
 #include <cmath>
+#include <limits>
 
 #include "log_cases.hpp"
 
@@ -83,6 +84,21 @@ void expect_main_path_of_magnitudes(part_of<typename F::input_type> lowest,
   };
   for (const U p : {lowest, n::one, highest}) expect(p, true);
   for (const U p : {U(0), U(1), U(lowest - 1), U(highest + 1), n::inf, n::nan}) expect(p, false);
+}
+
+/// x = 2^(k·step) gives 2^(k·result_step), exactly and with status 0, at every normal x whose
+/// result is normal too.
+template <typename F>
+void expect_exact_powers(int step, int result_step, location where = location::current()) {
+  using T = typename F::input_type;
+  using limits = std::numeric_limits<T>;
+  const auto normal = [](int e) {
+    return e >= limits::min_exponent - 1 && e < limits::max_exponent;
+  };
+  for (int k = -2000; k <= 2000; ++k) {
+    if (normal(k * step) && normal(k * result_step))
+      expect_number<F>(std::ldexp(T(1), k * step), std::ldexp(T(1), k * result_step), 0, where);
+  }
 }
 
 /// Results are even, or odd, in the sign bit.

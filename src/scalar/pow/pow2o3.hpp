@@ -14,7 +14,7 @@
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
 /// |x|^(2/3) for normal x at float, times 2^exponent: |x| = m·2^(3q + k), rows of (2^k·c)^(2/3) in
-/// two words for the middles c of 32 intervals of [1, 2), and degree 4 in m/c - 1. Within 0.52 ulp.
+/// two words for the middles c of 32 intervals of [1, 2), and degree 4 in m/c - 1. Within 0.53 ulp.
 LUMEN_MAIN float two_thirds_power_by_row(float x, std::uint32_t field_of_power) {
   const auto e = thirds<std::uint32_t>::of(((bits(x) >> 23) + 0xff) & 0xff);
   const auto m = thirty_second<float>::of(x);
@@ -28,8 +28,8 @@ LUMEN_MAIN float two_thirds_power_by_row(float x, std::uint32_t field_of_power) 
   return high + mad(high, p, low);
 }
 
-/// pow2o3, float; status 0. Within 0.52, 2.1, 890 ulp for `ha`, `la`, `ep`; denormals, which are
-/// scaled up, within 0.52 ulp.
+/// pow2o3, float; status 0. Within 0.53, 2.1, 890 ulp for `ha`, `la`, `ep`; denormals, which are
+/// scaled up, within 0.53 ulp.
 ///
 /// `ha` by rows of a table; `la` and `ep` by a polynomial over the whole of [1, 2), degree 7 in
 /// m - 1 and degree 3 in m.
@@ -88,7 +88,7 @@ struct pow2o3_reduction {
   }
 };
 
-/// |x|^(2/3) for normal x at double, rows in two words and degree 8 in g; within 0.52 ulp.
+/// |x|^(2/3) for normal x at double, rows in two words and degree 8 in g; within 0.53 ulp.
 LUMEN_MAIN double two_thirds_power_by_row(double x) {
   const auto a = pow2o3_reduction::of(x, internal_dpow2o3_ha_data);
   const double high = value(internal_dpow2o3_ha_data[32 + 2 * a.row]);
@@ -117,7 +117,7 @@ struct pow2o3_d_paths : scalar_v11<Body, double> {
 };
 
 /// pow2o3, double; status 0. `la` and `ep`, one body: rows in one word and degree 6; within 1.6
-/// ulp, denormals within 0.52 ulp.
+/// ulp, denormals within 0.53 ulp.
 template <tier t>
 struct pow2o3_d : pow2o3_d_paths<pow2o3_d<t>> {
   LUMEN_MAIN double of_normal(double x) {
@@ -129,7 +129,7 @@ struct pow2o3_d : pow2o3_d_paths<pow2o3_d<t>> {
   }
 };
 
-/// `ha`: by rows in two words; within 0.52 ulp.
+/// `ha`: by rows in two words; within 0.53 ulp.
 template <>
 struct pow2o3_d<tier::ha> : pow2o3_d_paths<pow2o3_d<tier::ha>> {
   LUMEN_MAIN double of_normal(double x) { return two_thirds_power_by_row(x); }

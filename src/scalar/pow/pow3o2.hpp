@@ -42,7 +42,7 @@ struct pow3o2_bounds<double> {
 
 /// x^(3/2) for positive normal x whose power is normal: x = m·2^(2q + k), a row of (2^k·c)^(3/2) in
 /// two words for the middle c of one of 32 intervals of [1, 2), and (1 + g)^(3/2) - 1 for
-/// g = m/c - 1 to degree 5 at float, 8 at double. Within 0.56 ulp at float, 0.52 ulp at double.
+/// g = m/c - 1 to degree 5 at float, 8 at double. Within 0.56 ulp.
 template <typename T>
 LUMEN_DEVICE inline T three_halves_power_by_row(T x) {
   using U = uint_of<T>;
@@ -72,10 +72,10 @@ LUMEN_DEVICE inline T three_halves_power_by_row(T x) {
 /// pow3o2, float and double. Code 1 for negative numbers and -infinity; code 0 otherwise, also
 /// where the result overflows or underflows.
 ///
-/// x·sqrt(x) from the root s: `ep` multiplies, within 1.5 ulp; `la` takes one step of Newton's
+/// x·sqrt(x) from the root s: `ep` multiplies, within 1.3 ulp; `la` takes one step of Newton's
 /// method from x/s, within 1.67 ulp; `ha` adds the term that s leaves out of the root, within 0.51
-/// ulp. Beyond the main path by rows of a table, within 0.56 ulp at float, 0.52 ulp at double;
-/// denormal results are rounded twice.
+/// ulp. Beyond the main path by rows of a table, within 0.56 ulp; denormal results, rounded twice,
+/// within 0.76 ulp.
 template <typename T, tier t>
 struct pow3o2_body : scalar_v11<pow3o2_body<T, t>, T> {
   using bounds = pow3o2_bounds<T>;

@@ -17,7 +17,7 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// invcbrt, float, without double arithmetic. Code 2 for zeros; ±0 for ±infinity.
 ///
 /// |x|, times 2^26 below 1, is m·2^e with m in [2/3, 4/3), and e = -3n - k up to the bias, so that
-/// the result is m^(-1/3)·2^(k/3)·2^n; 2^(k/3) is in two words. Within 0.86, 1.31, 0.86 ulp for
+/// the result is m^(-1/3)·2^(k/3)·2^n; 2^(k/3) is in two words. Within 0.86, 1.14, 0.86 ulp for
 /// `ha`, `la`, `ep`: degree 9, at `la` 8.
 template <tier t>
 struct invcbrt_s : scalar_v11<invcbrt_s<t>, float> {
