@@ -7,6 +7,7 @@
 
 #include "scalar/atrig/arctangent_polynomial.hpp"
 #include "scalar/atrig/half_angle.hpp"
+#include "scalar/atrig/quadrant.hpp"
 #include "scalar/half.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/tables/datan.hpp"
@@ -165,7 +166,7 @@ struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
     const double t = quotient(numerator, denominator);
     const double z = t * t;
     const double angle = high + (t + fma(arctangent_rest_of_segment(z), z * t, low));
-    return {value(bits(angle) ^ sign_bit(x)), flag_if<double>(is_extreme(pattern))};
+    return {value(bits(angle) ^ sign_bit(x)), flag_if<double>(is_extreme(x))};
   }
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
@@ -178,11 +179,6 @@ struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
   }
 
  private:
-  LUMEN_MAIN bool is_extreme(std::uint64_t pattern) {
-    const auto high = static_cast<std::uint32_t>(pattern >> 32);
-    return static_cast<std::int32_t>(high + 0x7fd00000u) > static_cast<std::int32_t>(0xfdcfffffu);
-  }
-
   /// n/d, all but correctly rounded: the float reciprocal corrected once, and the quotient once.
   LUMEN_MAIN double quotient(double n, double d) {
     const auto seed = static_cast<double>(divide(1.0f, static_cast<float>(d)));
