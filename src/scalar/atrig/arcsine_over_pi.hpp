@@ -12,13 +12,12 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// Q(z)/pi for Q(z) = arcsin(√z)/√z on [0, 1/4].
-LUMEN_MAIN float arcsine_factor_over_pi(float z) {
+/// Q(z)/pi for Q(z) = arcsin(√z)/√z on [0, 1/4]; at float what is beside 1/pi, over z.
+LUMEN_MAIN float arcsine_rest_over_pi(float z) {
   const float z2 = z * z;
-  const float p5 = fma(value(0x3c5ea355u), z, value(0x3bf87e20u));
-  const float p3 = fma(value(0x3c6d978cu), z, value(0x3cc36c37u));
-  const float p1 = fma(value(0x3d594d1bu), z, value(pi_words<float>::inverse));
-  return fma(fma(p5, z2, p3), z2, p1);
+  const float p3 = fma(value(0x3bf87e20u), z, value(0x3c6d978cu));
+  const float p1 = fma(value(0x3cc36c37u), z, value(0x3d594d1bu));
+  return fma(fma(value(0x3c5ea355u), z2, p3), z2, p1);
 }
 LUMEN_MAIN double arcsine_factor_over_pi(double z) {
   return horner(z, 0x3f84f45239939e37u, 0xbf759ee4331f54b9u, 0x3f79c78adbe84367u,
@@ -45,6 +44,8 @@ LUMEN_MAIN T base_and_arcsine_over_pi(T base, T v, const half_angle<T>& r) {
     return sum + (error + fma(small, inverse, product_low));
   } else if constexpr (t == tier::ep && sizeof(T) == 8) {
     return fma(arcsine_factor_ep(r.z) * v, inverse, base);
+  } else if constexpr (sizeof(T) == 4) {
+    return fma(arcsine_rest_over_pi(r.z), r.z * v, fma(v, inverse, base));
   } else {
     return fma(arcsine_factor_over_pi(r.z), v, base);
   }
