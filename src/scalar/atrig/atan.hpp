@@ -8,6 +8,7 @@
 #include "scalar/atrig/arctangent_polynomial.hpp"
 #include "scalar/atrig/half_angle.hpp"
 #include "scalar/atrig/quadrant.hpp"
+#include "scalar/atrig/tangent_reduction.hpp"
 #include "scalar/half.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/tables/datan.hpp"
@@ -130,12 +131,9 @@ struct atan_d_nolut : scalar_v11<atan_d_nolut, double> {
 template <>
 struct atan_d<tier::ep> : scalar_v11<atan_d<tier::ep>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
-    const bool direct = fabs(x) <= 1.0;
-    const auto seed = static_cast<double>(divide(1.0f, static_cast<float>(x)));
-    const double e = fma(-x, seed, 1.0);
-    const double t = select(direct, x, -fma(fma(e, e, e), seed, seed));
-    const double head = or_sign(select(direct, 0.0, value(pi_words<double>::half)), x);
-    return {fma(arctangent_factor_ep(t * t), t, head), flag_if<double>(is_special(x))};
+    const auto r = short_reciprocal::of(x);
+    const double head = or_sign(select(r.direct, 0.0, value(pi_words<double>::half)), x);
+    return {fma(arctangent_factor_ep(r.t * r.t), r.t, head), flag_if<double>(is_special(x))};
   }
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
@@ -145,27 +143,18 @@ struct atan_d<tier::ep> : scalar_v11<atan_d<tier::ep>, double> {
 };
 
 /// `ha`: five segments, arctan k + arctan((a - k)/(1 + ka)) with k = 0, 1/2, 1, 3/2, and pi/2 +
-/// arctan(-1/a) for the last; a - k is exact.
+/// arctan(-1/a) for the last.
 ///
 /// The rare path serves a < 2^-1020 and a >= 2^993, where the result is x and pi/2 to the last bit:
 /// it needs no table.
 template <>
 struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
-    const double a = fabs(x);
-    const std::uint64_t pattern = bits(a);
-    const auto row =
-        16 - 4 * (std::int32_t{pattern > 0x3fdc0000ffffffffu} + (pattern > 0x3fe60000ffffffffu) +
-                  (pattern > 0x3ff30000ffffffffu) + (pattern > 0x40038000ffffffffu));
-    const double k = value(internal_datan_ha_data[row]);
-    const std::uint64_t kept = internal_datan_ha_data[row + 1];
-    const double high = value(internal_datan_ha_data[row + 2]);
-    const double low = value(internal_datan_ha_data[row + 3]);
-    const double numerator = value(pattern & kept) - k;
-    const double denominator = fma(k, a, value(format<double>::one & kept));
-    const double t = quotient(numerator, denominator);
-    const double z = t * t;
-    const double angle = high + (t + fma(arctangent_rest_of_segment(z), z * t, low));
+    const auto s = tangent_segment::of(fabs(x));
+    const double high = value(internal_datan_ha_data[s.row + 2]);
+    const double low = value(internal_datan_ha_data[s.row + 3]);
+    const double z = s.t * s.t;
+    const double angle = high + (s.t + fma(arctangent_rest_of_segment(z), z * s.t, low));
     return {value(bits(angle) ^ sign_bit(x)), flag_if<double>(is_extreme(x))};
   }
 
@@ -176,15 +165,6 @@ struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
       *y = fabs(x) < 1.0 ? x : or_sign(value(pi_words<double>::half), x);
     }
     return mask(code::none);
-  }
-
- private:
-  /// n/d, all but correctly rounded: the float reciprocal corrected once, and the quotient once.
-  LUMEN_MAIN double quotient(double n, double d) {
-    const auto seed = static_cast<double>(divide(1.0f, static_cast<float>(d)));
-    const double reciprocal = fma(seed, fma(-d, seed, 1.0), seed);
-    const double q = n * reciprocal;
-    return fma(fma(-d, q, n), reciprocal, q);
   }
 };
 

@@ -40,16 +40,18 @@ LUMEN_MAIN bool is_extreme(double x) {
   return static_cast<std::int32_t>(high + 0x7fd00000u) > static_cast<std::int32_t>(0xfdcfffffu);
 }
 
-/// t with |t| <= 1 and a base of 0 or 1/4 turn, so that base + arctan t is the angle of (|x|, |y|);
-/// a NaN operand and points at 45 degrees have the base.
+/// t with |t| <= 1, so that base + arctan t is the angle of (|x|, |y|): the base is a quarter turn
+/// where the quotient is inverted, otherwise 0.
 template <typename T>
 struct true_quotient {
   T t;
   bool inverted;
 
-  LUMEN_MAIN true_quotient of(T y, T x) {
+  LUMEN_MAIN true_quotient of(T y, T x) { return of(y, x, !(fabs(y) < fabs(x))); }
+
+  /// The same for a choice of the caller where |y| = |x|.
+  LUMEN_MAIN true_quotient of(T y, T x, bool inverted) {
     const T ay = fabs(y), ax = fabs(x);
-    const bool inverted = !(ay < ax);
     return {divide(select(inverted, -ax, ay), select(inverted, ay, ax)), inverted};
   }
 };
