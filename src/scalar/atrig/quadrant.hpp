@@ -23,14 +23,14 @@ struct quadrant {
     return {select(steep, ax, ay), select(steep, ay, ax), steep, sign_bit(x) != 0};
   }
 
-  /// An angle's sign bit where the angle counts down from a base: pi/2, and pi for flat points.
+  /// An angle's sign bit where the angle counts down from its base.
   LUMEN_DEVICE uint_of<T> down() const {
     return select(steep != negative, format<T>::sign, uint_of<T>{0});
   }
 
-  /// One of four words by the octant.
-  LUMEN_DEVICE T octant(T flat, T steep_right, T flat_left, T steep_left) const {
-    return select(negative, select(steep, steep_left, flat_left), select(steep, steep_right, flat));
+  /// The angle that it counts from: 0, a quarter or a half turn.
+  LUMEN_DEVICE T base(T quarter, T half) const {
+    return select(steep, quarter, select(negative, half, T(0)));
   }
 };
 
