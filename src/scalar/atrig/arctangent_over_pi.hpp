@@ -12,6 +12,10 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
+/// The pattern of 1/2: a quarter turn.
+template <typename T>
+inline constexpr uint_of<T> one_half = format<T>::one - (uint_of<T>{1} << format<T>::fraction_bits);
+
 /// P(z) on [0, 1], degree 21.
 LUMEN_MAIN double arctangent_factor_over_pi(double z) {
   return horner(z, 0xbec435d571d7fb69u, 0x3efee969b7db1149u, 0xbf26798a20dc9977u,

@@ -6,6 +6,7 @@
 #include <cstdint>
 
 #include "scalar/atrig/arctangent_polynomial.hpp"
+#include "scalar/atrig/bitwise_choice.hpp"
 #include "scalar/atrig/half_angle.hpp"
 #include "scalar/atrig/quadrant.hpp"
 #include "scalar/atrig/tangent_reduction.hpp"
@@ -94,13 +95,13 @@ struct atan_d<tier::la> : scalar_v11<atan_d<tier::la>, double> {
     const double shifter = value(0x4318000000000000u);  // 3·2^49, unit 1/4
     const double shifted = a + shifter;
     const double b = shifted - shifter;
-    const bool inverted = a >= 7.875;
+    const auto inverted = mask_of<double>(a >= 7.875);
     const double clamped = select(a < 0x1p128, a, 0x1p128);
-    const double numerator = select(inverted, -1.0, a - b);
-    const double denominator = select(inverted, clamped, fma(a, b, 1.0));
+    const double numerator = chosen(inverted, -1.0, a - b);
+    const double denominator = chosen(inverted, clamped, fma(a, b, 1.0));
     const auto row = static_cast<std::int32_t>(bits(shifted) & 31u);
     const double arctan_b = value(internal_datan_la_data_avx512[row]);
-    const double base = select(inverted, value(pi_words<double>::half), arctan_b);
+    const double base = chosen(inverted, value(pi_words<double>::half), arctan_b);
     const double t = divide(numerator, denominator);
     const double angle = fma(polynomial(t * t), (t * t) * t, t) + base;
     return {value(bits(angle) ^ sign_bit(x))};
@@ -132,7 +133,7 @@ template <>
 struct atan_d<tier::ep> : scalar_v11<atan_d<tier::ep>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
     const auto r = short_reciprocal::of(x);
-    const double head = or_sign(select(r.direct, 0.0, value(pi_words<double>::half)), x);
+    const double head = or_sign(value(~r.direct & pi_words<double>::half), x);
     return {fma(arctangent_factor_ep(r.t * r.t), r.t, head), flag_if<double>(is_special(x))};
   }
 

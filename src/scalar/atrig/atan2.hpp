@@ -31,13 +31,13 @@ struct atan2_s : scalar_v21<atan2_s<t>, float> {
 
   LUMEN_RARE std::uint32_t rare(float y, float x, float* r) {
     auto p = quadrant<float>::of(y, x);
-    const float base = p.base(value(pi_words<float>::half), value(pi_words<float>::whole));
+    const float base = p.base(pi_words<float>::half, pi_words<float>::whole);
     if (is_nan(p.larger)) {
       *r = value(bits(is_nan(x) ? x : y) | 0x00400000u);
     } else if (p.smaller == 0) {
       *r = or_sign(base, y);
     } else if (is_infinite(p.larger)) {
-      const float diagonal = value(p.negative ? 0x4016cbe4u : 0x3f490fdbu);  // 3·pi/4, pi/4
+      const float diagonal = value(p.left != 0 ? 0x4016cbe4u : 0x3f490fdbu);  // 3·pi/4, pi/4
       *r = or_sign(is_infinite(p.smaller) ? diagonal : base, y);
     } else {
       const float scale = value(bits(p.larger) > highest ? 0x1f800000u : 0x5f800000u);  // 2^∓64
@@ -54,11 +54,11 @@ struct atan2_s : scalar_v21<atan2_s<t>, float> {
   static constexpr std::uint32_t highest = 0x7e800000u;  // 2^126, its reciprocal is normal
 
   LUMEN_MAIN float angle(const quadrant<float>& p) {
-    const float base = p.base(value(pi_words<float>::half), value(pi_words<float>::whole));
+    const float base = p.base(pi_words<float>::half, pi_words<float>::whole);
     const float reciprocal = divide(1.0f, p.larger);
     const float q = reciprocal * p.smaller;
     if constexpr (t == tier::ha) {
-      const float low = p.base(value(pi_words<float>::half_low), value(pi_words<float>::whole_low));
+      const float low = p.base(pi_words<float>::half_low, pi_words<float>::whole_low);
       const float q_low = fma(-p.larger, q, p.smaller) * reciprocal;
       const float polynomial = arctangent_rest_at_half((q - 0.5f) + q_low);
       const float rest = fma(q, polynomial, fma(polynomial, q_low, q_low));
@@ -87,10 +87,10 @@ template <tier t>
 struct atan2_d : scalar_v21<atan2_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double y, double x) {
     const auto q = true_quotient<double>::of(y, x);
-    const double base = select(q.inverted, value(pi_words<double>::half), 0.0);
+    const double base = q.base(pi_words<double>::half);
     const double angle = fma(arctangent_rest(q.t * q.t), q.t, q.t) + base;
     const bool on_axis = ((x == 0) != (y == 0)) & !(is_nan(x) | is_nan(y));
-    return {turned(angle, y, x, value(pi_words<double>::whole)),
+    return {turned(angle, y, x, pi_words<double>::whole),
             flag_if<double>((is_extreme(x) | is_extreme(y)) & !on_axis)};
   }
 
@@ -117,7 +117,7 @@ struct point_segment {
     const double reciprocal = divide(1.0, below);
     const double t = above * reciprocal;
     const double rest = fma(-t, below_low, fma(-t, below, above));
-    const auto octant = 2 * std::int32_t{p.negative} + std::int32_t{p.steep};
+    const auto octant = static_cast<std::int32_t>((p.left & 2u) + (p.steep & 1u));
     return {2 * (3 * octant + j), value(bits(t) ^ p.down()),
             value(bits(rest * reciprocal) ^ p.down())};
   }

@@ -44,9 +44,10 @@ struct atan2pi_s_paths : scalar_v21<Body, float> {
 struct atan2pi_s : atan2pi_s_paths<atan2pi_s> {
   LUMEN_MAIN float angle(float y, float x) {
     const auto q = true_quotient<double>::of(static_cast<double>(y), static_cast<double>(x));
-    const double base = select(q.inverted, 0.5, 0.0);
+    const double base = q.base(one_half<double>);
     const double v = fma(arctangent_factor_over_pi_short(q.t * q.t), q.t, base);
-    return static_cast<float>(turned(v, static_cast<double>(y), static_cast<double>(x), 1.0));
+    return static_cast<float>(
+        turned(v, static_cast<double>(y), static_cast<double>(x), format<double>::one));
   }
 };
 
@@ -54,8 +55,8 @@ struct atan2pi_s : atan2pi_s_paths<atan2pi_s> {
 struct atan2pi_s_nofp64 : atan2pi_s_paths<atan2pi_s_nofp64> {
   LUMEN_MAIN float angle(float y, float x) {
     const auto q = true_quotient<float>::of(y, x, fabs(y) > fabs(x));
-    const float base = select(q.inverted, 0.5f, 0.0f);
-    return turned(fma(arctangent_factor_over_pi(q.t * q.t), q.t, base), y, x, 1.0f);
+    const float base = q.base(one_half<float>);
+    return turned(fma(arctangent_factor_over_pi(q.t * q.t), q.t, base), y, x, format<float>::one);
   }
 };
 
@@ -63,9 +64,9 @@ struct atan2pi_s_nofp64 : atan2pi_s_paths<atan2pi_s_nofp64> {
 struct atan2pi_s_ep : atan2pi_s_paths<atan2pi_s_ep> {
   LUMEN_MAIN float angle(float y, float x) {
     const auto q = true_quotient<float>::of(y, x);
-    const float base = select(q.inverted, 0.5f, 0.0f);
+    const float base = q.base(one_half<float>);
     const float v = arctangent_factor_ep(fabs(q.t)) * q.t;
-    return turned(fma(v, value(pi_words<float>::inverse), base), y, x, 1.0f);
+    return turned(fma(v, value(pi_words<float>::inverse), base), y, x, format<float>::one);
   }
 };
 
@@ -77,10 +78,11 @@ template <tier t>
 struct atan2pi_d : scalar_v21<atan2pi_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double y, double x) {
     const auto q = true_quotient<double>::of(y, x);
-    const double base = select(q.inverted, 0.5, 0.0);
+    const double base = q.base(one_half<double>);
     const double angle = fma(arctangent_factor_over_pi(q.t * q.t), q.t, base);
     const bool on_axis = ((x == 0) != (y == 0)) & !(is_nan(x) | is_nan(y));
-    return {turned(angle, y, x, 1.0), flag_if<double>((is_extreme(x) | is_extreme(y)) & !on_axis)};
+    return {turned(angle, y, x, format<double>::one),
+            flag_if<double>((is_extreme(x) | is_extreme(y)) & !on_axis)};
   }
 
   LUMEN_RARE std::uint32_t rare(double y, double x, double* r) {

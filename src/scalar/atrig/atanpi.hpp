@@ -8,6 +8,7 @@
 #include "scalar/atrig/arctangent_over_pi.hpp"
 #include "scalar/atrig/arctangent_polynomial.hpp"
 #include "scalar/atrig/atan.hpp"
+#include "scalar/atrig/bitwise_choice.hpp"
 #include "scalar/atrig/careful_angle.hpp"
 #include "scalar/atrig/tangent_reduction.hpp"
 #include "scalar/half.hpp"
@@ -50,21 +51,21 @@ template <>
 struct atanpi_d<tier::la> : scalar_v11<atanpi_d<tier::la>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
     const double a = fabs(x);
-    const bool inverted = a > 1.0;
-    const double t = select(inverted, -reciprocal(select(a < 0x1p100, a, 0x1p100)), a);
-    const double base = select(inverted, 0.5, 0.0);
+    const auto inverted = mask_of<double>(a > 1.0);
+    const double t = chosen(inverted, -reciprocal(select(a < 0x1p100, a, 0x1p100)), a);
+    const double base = value(inverted & one_half<double>);
     return {or_sign(fma(arctangent_factor_over_pi(t * t), t, base), x)};
   }
 
  private:
   /// 1/a for a in [1, 2^100].
   LUMEN_MAIN double reciprocal(double a) {
-    double c = static_cast<double>(value(0x7ef311c7u - bits(static_cast<float>(a))));
-    for (int i = 0; i < 3; ++i) {
-      const double e = fma(-a, c, 1.0);
-      c = fma(fma(e, e, e), c, c);
-    }
-    return c;
+    const auto seed = value(0x7ef311c7u - bits(static_cast<float>(a)));
+    return corrected(a, corrected(a, corrected(a, static_cast<double>(seed))));
+  }
+  LUMEN_MAIN double corrected(double a, double c) {
+    const double e = fma(-a, c, 1.0);
+    return fma(fma(e, e, e), c, c);
   }
 };
 
@@ -73,7 +74,7 @@ template <>
 struct atanpi_d<tier::ep> : scalar_v11<atanpi_d<tier::ep>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
     const auto r = short_reciprocal::of(x);
-    const double base = or_sign(select(r.direct, 0.0, 0.5), x);
+    const double base = or_sign(value(~r.direct & one_half<double>), x);
     const double angle = arctangent_factor_ep(r.t * r.t) * r.t;
     return {fma(angle, value(pi_words<double>::inverse), base), flag_if<double>(is_special(x))};
   }

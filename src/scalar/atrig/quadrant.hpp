@@ -5,6 +5,7 @@
 
 #include <cstdint>
 
+#include "scalar/atrig/bitwise_choice.hpp"
 #include "scalar/ops.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
@@ -14,23 +15,23 @@ template <typename T>
 struct quadrant {
   T smaller;
   T larger;
-  bool steep;     ///< the ordinate is the larger one
-  bool negative;  ///< the abscissa has its sign bit set
+  uint_of<T> steep;  ///< all bits set if the ordinate is the larger one
+  uint_of<T> left;   ///< all bits set if the abscissa has its sign bit set
 
   LUMEN_MAIN quadrant of(T y, T x) {
-    const T ay = fabs(y), ax = fabs(x);
-    const bool steep = bits(ax) < bits(ay);
-    return {select(steep, ax, ay), select(steep, ay, ax), steep, sign_bit(x) != 0};
+    const uint_of<T> ay = bits(fabs(y)), ax = bits(fabs(x));
+    const auto steep = mask_of<T>(static_cast<int_of<T>>(ax) < static_cast<int_of<T>>(ay));
+    const uint_of<T> exchanged = (ax ^ ay) & steep;
+    const auto left = mask_of<T>(static_cast<int_of<T>>(bits(x)) < 0);
+    return {value(ay ^ exchanged), value(ax ^ exchanged), steep, left};
   }
 
   /// An angle's sign bit where the angle counts down from its base.
-  LUMEN_DEVICE uint_of<T> down() const {
-    return select(steep != negative, format<T>::sign, uint_of<T>{0});
-  }
+  LUMEN_DEVICE uint_of<T> down() const { return (steep ^ left) & format<T>::sign; }
 
-  /// The angle that it counts from: 0, a quarter or a half turn.
-  LUMEN_DEVICE T base(T quarter, T half) const {
-    return select(steep, quarter, select(negative, half, T(0)));
+  /// The angle that it counts from: 0, a quarter or a half turn, given as patterns.
+  LUMEN_DEVICE T base(uint_of<T> quarter, uint_of<T> half) const {
+    return value((steep & quarter) | (~steep & left & half));
   }
 };
 
@@ -45,22 +46,27 @@ LUMEN_MAIN bool is_extreme(double x) {
 template <typename T>
 struct true_quotient {
   T t;
-  bool inverted;
+  uint_of<T> inverted;  ///< all bits set if it is
 
   LUMEN_MAIN true_quotient of(T y, T x) { return of(y, x, !(fabs(y) < fabs(x))); }
 
   /// The same for a choice of the caller where |y| = |x|.
   LUMEN_MAIN true_quotient of(T y, T x, bool inverted) {
-    const T ay = fabs(y), ax = fabs(x);
-    return {divide(select(inverted, -ax, ay), select(inverted, ay, ax)), inverted};
+    const uint_of<T> ay = bits(fabs(y)), ax = bits(fabs(x));
+    const auto m = mask_of<T>(inverted);
+    const uint_of<T> exchanged = (ax ^ ay) & m;
+    return {divide(value((ay ^ exchanged) | (m & format<T>::sign)), value(ax ^ exchanged)), m};
   }
+
+  /// The base, for a quarter turn given as a pattern.
+  LUMEN_DEVICE T base(uint_of<T> quarter) const { return value(inverted & quarter); }
 };
 
-/// The angle of (|x|, |y|) turned to that of (x, y), for a half turn of the given size.
+/// The angle of (|x|, |y|) turned to that of (x, y), for a half turn given as a pattern.
 template <typename T>
-LUMEN_MAIN T turned(T angle, T y, T x, T half_turn) {
-  const T reflected = value(bits(angle) ^ sign_bit(x));
-  return or_sign(reflected + select(sign_bit(x) != 0, half_turn, T(0)), y);
+LUMEN_MAIN T turned(T angle, T y, T x, uint_of<T> half) {
+  const auto left = mask_of<T>(static_cast<int_of<T>>(bits(x)) < 0);
+  return or_sign(value(bits(angle) ^ sign_bit(x)) + value(left & half), y);
 }
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

@@ -6,6 +6,7 @@
 
 #include <cstdint>
 
+#include "scalar/atrig/bitwise_choice.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/tables/datan.hpp"
 
@@ -14,13 +15,13 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// x up to 1, -1/x beyond: the float reciprocal, corrected once. Not for infinities.
 struct short_reciprocal {
   double t;
-  bool direct;
+  std::uint64_t direct;  ///< all bits set up to 1
 
   LUMEN_MAIN short_reciprocal of(double x) {
-    const bool direct = fabs(x) <= 1.0;
+    const auto direct = mask_of<double>(fabs(x) <= 1.0);
     const auto seed = static_cast<double>(divide(1.0f, static_cast<float>(x)));
     const double e = fma(-x, seed, 1.0);
-    return {select(direct, x, -fma(fma(e, e, e), seed, seed)), direct};
+    return {chosen(direct, x, -fma(fma(e, e, e), seed, seed)), direct};
   }
 };
 
