@@ -41,8 +41,8 @@ LUMEN_MAIN double arctangent_factor_over_pi_short(double z) {
   return fma(odd, z, even);
 }
 
-/// base + (arctan t)/pi for |t| <= 7/16 in the words t and t_low, rounded nearly once: base in two
-/// words and at least as large as t/pi, or 0.
+/// base + (t + rest)/pi, rounded nearly once, for a rest that is small beside t. The base comes in
+/// two words and is 0 or larger than t/pi.
 LUMEN_MAIN double base_and_arctangent_over_pi(double base, double base_low, double t, double rest) {
   const double inverse = value(pi_words<double>::inverse);
   const double product = t * inverse;

@@ -21,7 +21,7 @@ LUMEN_MAIN std::uint32_t sign_mask(std::uint32_t difference) {
   return static_cast<std::uint32_t>(static_cast<std::int32_t>(difference) >> 31);
 }
 
-/// atan, float; status 0 for every argument. Largest error 0.97, 3.1 and 2.3e3 ulp for `ha`, `la`,
+/// atan, float; status 0 for every argument. Largest error 0.97, 3.2 and 2.3e3 ulp for `ha`, `la`,
 /// `ep`.
 template <tier t>
 struct atan_s;
@@ -80,7 +80,7 @@ struct atan_s<tier::ha> : scalar_v11<atan_s<tier::ha>, float> {
   }
 };
 
-/// atan, double; status 0 for every argument. Largest error 0.75, 1.9 and 2.2e7 ulp for `ha`, `la`,
+/// atan, double; status 0 for every argument. Largest error 0.85, 1.9 and 2.2e7 ulp for `ha`, `la`,
 /// `ep`.
 template <tier t>
 struct atan_d;

@@ -71,7 +71,7 @@ struct atan2pi_s_ep : atan2pi_s_paths<atan2pi_s_ep> {
 };
 
 /// atan2pi, double; status 0 for all points. `la` and `ep` are one body, with a true division and
-/// degree 21. Largest error 0.85 ulp at `ha`, 2.6 at `la` and `ep`.
+/// degree 21. Largest error 0.85 ulp at `ha`, 2.7 at `la` and `ep`.
 ///
 /// The rare paths are those of atan2.
 template <tier t>
@@ -80,9 +80,7 @@ struct atan2pi_d : scalar_v21<atan2pi_d<t>, double> {
     const auto q = true_quotient<double>::of(y, x);
     const double base = q.base(one_half<double>);
     const double angle = fma(arctangent_factor_over_pi(q.t * q.t), q.t, base);
-    const bool on_axis = ((x == 0) != (y == 0)) & !(is_nan(x) | is_nan(y));
-    return {turned(angle, y, x, format<double>::one),
-            flag_if<double>((is_extreme(x) | is_extreme(y)) & !on_axis)};
+    return {turned(angle, y, x, format<double>::one), flag_if<double>(is_extreme_point(y, x))};
   }
 
   LUMEN_RARE std::uint32_t rare(double y, double x, double* r) {

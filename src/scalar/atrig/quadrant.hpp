@@ -41,6 +41,16 @@ LUMEN_MAIN bool is_extreme(double x) {
   return static_cast<std::int32_t>(high + 0x7fd00000u) > static_cast<std::int32_t>(0xfdcfffffu);
 }
 
+/// A point with an extreme coordinate, but not one whose other coordinate is a zero: the quotient
+/// of these is 0. The origin has no quotient.
+LUMEN_MAIN bool is_extreme_point(double y, double x) {
+  const bool extreme_y = is_extreme(y), extreme_x = is_extreme(x);
+  const bool zero_y = y == 0, zero_x = x == 0;
+  const bool nan_y = is_nan(y), nan_x = is_nan(x);
+  const bool on_axis = (zero_y != zero_x) & !(nan_y | nan_x);
+  return (extreme_y | extreme_x) & !on_axis;
+}
+
 /// t with |t| <= 1, so that base + arctan t is the angle of (|x|, |y|): the base is a quarter turn
 /// where the quotient is inverted, otherwise 0.
 template <typename T>
