@@ -61,7 +61,7 @@ struct acos_s : acos_paths<acos_s<t>, float> {
   }
 };
 
-/// acos, double. The polynomial has degree 12, at `ep` 5. Largest error 0.68, 2.2 and 4.1e7 ulp
+/// acos, double. The polynomial has degree 12, at `ep` 5. Largest error 0.72, 2.3 and 4.1e7 ulp
 /// for `ha`, `la`, `ep`.
 template <tier t>
 struct acos_d : acos_paths<acos_d<t>, double> {
