@@ -28,7 +28,7 @@ template <tier t>
 struct cos_s : scalar_v11<cos_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
     const float a = fabs(x);
-    const auto next = rest_of_quarter_turn_next < t == tier::la ? 3 : 2 > (a);
+    const auto next = rest_of_quarter_turn_next<parts_of_pi<t>>(a);
     return {one_if_hidden(next, sine(next.rest)), flag_if<float>(!(a <= value(0x461c4000u)))};
   }
 
@@ -67,7 +67,7 @@ struct cos_s<tier::ha> : scalar_v11<cos_s<tier::ha>, float> {
 template <tier t>
 struct cos_d : scalar_v11<cos_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
-    const auto next = rest_of_quarter_turn_next < t == tier::la ? 3 : 2 > (fabs(x));
+    const auto next = rest_of_quarter_turn_next<parts_of_pi<t>>(fabs(x));
     const double r = next.rest;
     const double z = r * r;
     const double y = fma(polynomial(z) * z, r, r);

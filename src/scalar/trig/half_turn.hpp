@@ -29,6 +29,10 @@ struct pi_parts<double> {
   static constexpr std::uint64_t shifter = 0x4338000000000000;  // 3·2^51
 };
 
+/// How many parts the tiers below `ha` take.
+template <tier t>
+inline constexpr int parts_of_pi = t == tier::la ? 3 : 2;
+
 /// x + n pi, with pi in two or three parts.
 template <int parts, typename T>
 LUMEN_MAIN T plus_half_turns(T n, T x) {

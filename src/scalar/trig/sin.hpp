@@ -27,7 +27,7 @@ template <tier t>
 struct sin_s : scalar_v11<sin_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
     const float a = fabs(x);
-    const float r = rest_of_half_turns < t == tier::la ? 3 : 2 > (a);
+    const float r = rest_of_half_turns<parts_of_pi<t>>(a);
     return {value(bits(sine(r)) ^ sign_bit(x)), flag_if<float>(!(a <= value(0x461c4000u)))};
   }
 
@@ -66,7 +66,7 @@ template <tier t>
 struct sin_d : scalar_v11<sin_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
     const double a = fabs(x);
-    const double r = rest_of_half_turns < t == tier::la ? 3 : 2 > (a);
+    const double r = rest_of_half_turns<parts_of_pi<t>>(a);
     const double z = r * r;
     const double y = fma(polynomial(z) * z, r, r);
     return {value(bits(y) ^ sign_bit(x)), flag_if<double>(!(a <= value(0x4170000000000000u)))};

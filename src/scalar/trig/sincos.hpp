@@ -9,6 +9,7 @@
 #include "scalar/horner.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/trig/fixed_turn.hpp"
+#include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_cosine.hpp"
 #include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
@@ -116,7 +117,7 @@ struct sincos_d : scalar_v12<sincos_d<t>, double> {
     if constexpr (t == tier::ha) {
       return short_quarter_turn::by_products(a);
     } else {
-      return short_quarter_turn::in_one_word < t == tier::la ? 3 : 2 > (a);
+      return short_quarter_turn::in_one_word<parts_of_pi<t>>(a);
     }
   }
 
