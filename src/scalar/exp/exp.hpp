@@ -26,12 +26,62 @@ struct natural_base_s {
 /// exp, float; within 0.86 ulp in every tier.
 using exp_s = half_step_power<natural_base_s>;
 
+/// e^x = scale·(1 + rest) at double. The exponent field of the scale wraps where it does not
+/// suffice.
+struct exponential_factors {
+  std::uint64_t scale;
+  double rest;
+};
+
+/// The same by a reduction to half-integers as at float, with a polynomial of degree 9; `ha` adds
+/// the rest of the double √2 in the polynomial's last step.
+template <tier t>
+struct half_step_factors_d {
+  LUMEN_MAIN exponential_factors of(double x) {
+    const reduced a = reduce(x);
+    return with_rest(a.shifted, a.r);
+  }
+
+  /// Of x + tail, the tail being small against x.
+  LUMEN_MAIN exponential_factors of(double x, double tail) {
+    const reduced a = reduce(x);
+    return with_rest(a.shifted, a.r + tail);
+  }
+
+ private:
+  struct reduced {
+    std::uint64_t shifted;
+    double r;
+  };
+
+  LUMEN_MAIN reduced reduce(double x) {
+    const double shifter = value(0x43280000000007feu);  // unit 1/2, 3·2^50 + 1023
+    const double shifted = fma(x, value(0x3ff71547652b82feu), shifter);
+    const double n = shifted - shifter;
+    const double r = fma(value(0xbfe62e42fefa39efu), n, x);
+    return {bits(shifted), fma(value(0xbc7abc9e3b39803fu), n, r)};
+  }
+
+  LUMEN_MAIN exponential_factors with_rest(std::uint64_t shifted, double r) {
+    const double p = horner(r, 0x3ec722bccc270959u, 0x3efa072e44b58159u, 0x3f2a019f7560fba3u,
+                            0x3f56c16b8144bd5bu, 0x3f811111111ac486u, 0x3fa55555556228ceu,
+                            0x3fc5555555555462u, 0x3fdffffffffffe76u, 0x3ff0000000000000u);
+    const std::uint64_t odd = 0u - (shifted & 1u);
+    const std::uint64_t scale = (shifted << 51) ^ (odd & 0x000ea09e667f3bcdu);  // √2
+    if constexpr (t == tier::ha) {
+      const double root_rest = value((odd & 0x80e182ab00000000u) ^ 0x3c6e51c500000000u);
+      return {scale, fma(p, r, root_rest)};
+    } else {
+      return {scale, p * r};
+    }
+  }
+};
+
 /// exp, double. Code 3 for an infinite result, code 4 for one below the smallest normal number, the
 /// results of ±infinity included.
 ///
-/// `ha` and `la` reduce to half-integers as at float, with a polynomial of degree 9; `ha` adds the
-/// rest of the double √2 in the polynomial's last step. `ep` takes the first step of the reduction
-/// in float, to integers, with a polynomial of degree 6. Largest error 0.92, 1.25, 1.7e7 ulp.
+/// `ha` and `la` reduce to half-integers; `ep` takes the first step of the reduction in float, to
+/// integers, with a polynomial of degree 6. Largest error 0.92, 1.25, 1.7e7 ulp.
 template <tier t>
 struct exp_d : scalar_v11<exp_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
@@ -59,11 +109,7 @@ struct exp_d : scalar_v11<exp_d<t>, double> {
   }
 
  private:
-  /// e^x = scale·(1 + rest). The exponent field of the scale wraps where it does not suffice.
-  struct factors {
-    std::uint64_t scale;
-    double rest;
-  };
+  using factors = exponential_factors;
 
   LUMEN_MAIN factors factorize(double x) {
     if constexpr (t == tier::ep) {
@@ -76,22 +122,7 @@ struct exp_d : scalar_v11<exp_d<t>, double> {
                                  0xbdd63f26cce7780fu);
       return {std::uint64_t{bits(shifted)} << 52, rest};
     } else {
-      const double shifter = value(0x43280000000007feu);  // unit 1/2, 3·2^50 + 1023
-      const double shifted = fma(x, value(0x3ff71547652b82feu), shifter);
-      const double n = shifted - shifter;
-      double r = fma(value(0xbfe62e42fefa39efu), n, x);
-      r = fma(value(0xbc7abc9e3b39803fu), n, r);
-      const double p = horner(r, 0x3ec722bccc270959u, 0x3efa072e44b58159u, 0x3f2a019f7560fba3u,
-                              0x3f56c16b8144bd5bu, 0x3f811111111ac486u, 0x3fa55555556228ceu,
-                              0x3fc5555555555462u, 0x3fdffffffffffe76u, 0x3ff0000000000000u);
-      const std::uint64_t odd = 0u - (bits(shifted) & 1u);
-      const std::uint64_t scale = (bits(shifted) << 51) ^ (odd & 0x000ea09e667f3bcdu);  // √2
-      if constexpr (t == tier::ha) {
-        const double root_rest = value((odd & 0x80e182ab00000000u) ^ 0x3c6e51c500000000u);
-        return {scale, fma(p, r, root_rest)};
-      } else {
-        return {scale, p * r};
-      }
+      return half_step_factors_d<t>::of(x);
     }
   }
 

@@ -18,15 +18,23 @@ LUMEN_DEVICE inline std::uint32_t exp2_status(T result) {
   return mask(bits(result) == format<T>::special ? code::overflow : code::none);
 }
 
+/// 2^f at float for |f| <= 1/2, as (1 + f/2) + e: the main part is kept in two words, so that its
+/// rounding does not count.
+LUMEN_MAIN float exp2_of_fraction(float f) {
+  const float a = horner(f, 0x39224c80u, 0x3aafa463u, 0x3c1d94cbu, 0x3d635766u, 0x3e75fdf1u,
+                         0x3e45c862u);  // the last one ln 2 - 1/2
+  const float b = fma(f, 0.5f, 1.0f);
+  const float c = b - 1.0f;
+  const float d = fma(f, 0.5f, -c);
+  return b + fma(a, f, d);
+}
+
 /// exp2, float; one body for all tiers, within 0.79 ulp. Of a finite argument code 3 for an
 /// infinite result, code 4 for one below the smallest normal number; ±infinity has code 0.
-///
-/// x = n + f with |f| <= 1/2, and 2^f = (1 + f/2) + e: the main part is kept in two words, so that
-/// its rounding does not count.
 struct exp2_s : scalar_v11<exp2_s, float> {
   LUMEN_MAIN main_result<float> main(float x) {
     const float n = rint(x);
-    const float y = power_of_fraction(x - n);
+    const float y = exp2_of_fraction(x - n);
     // The integer n, exact for |n| < 2^22; from larger ones and NaNs an integer outside -125..126.
     const std::uint32_t shifter = 0x4b400000;  // 3·2^22
     const std::uint32_t i = bits(n + value(shifter)) - shifter;
@@ -42,20 +50,11 @@ struct exp2_s : scalar_v11<exp2_s, float> {
     const auto k = static_cast<std::int32_t>(rint(c));
     const std::int32_t a = k >> 1;
     const std::int32_t b = k - a;
-    *y = (power_of_fraction(x - rint(x)) * power_of_two(b)) * power_of_two(a);
+    *y = (exp2_of_fraction(x - rint(x)) * power_of_two(b)) * power_of_two(a);
     return exp2_status(*y);
   }
 
  private:
-  LUMEN_MAIN float power_of_fraction(float f) {
-    const float a = horner(f, 0x39224c80u, 0x3aafa463u, 0x3c1d94cbu, 0x3d635766u, 0x3e75fdf1u,
-                           0x3e45c862u);  // the last one ln 2 - 1/2
-    const float b = fma(f, 0.5f, 1.0f);
-    const float c = b - 1.0f;
-    const float d = fma(f, 0.5f, -c);
-    return b + fma(a, f, d);
-  }
-
   LUMEN_DEVICE static float power_of_two(std::int32_t e) {
     return value((static_cast<std::uint32_t>(e) << 23) + format<float>::one);
   }
