@@ -42,10 +42,15 @@ struct half_step_factors_d {
     return with_rest(a.shifted, a.r);
   }
 
-  /// Of x + tail, the tail being small against x.
+  /// Of x + tail, the tail being small against x. `ha` also keeps what the sum rounds off.
   LUMEN_MAIN exponential_factors of(double x, double tail) {
     const reduced a = reduce(x);
-    return with_rest(a.shifted, a.r + tail);
+    const double r = a.r + tail;
+    if constexpr (t == tier::ha) {
+      return with_rest(a.shifted, r, tail - (r - a.r));
+    } else {
+      return with_rest(a.shifted, r);
+    }
   }
 
  private:
@@ -63,17 +68,33 @@ struct half_step_factors_d {
   }
 
   LUMEN_MAIN exponential_factors with_rest(std::uint64_t shifted, double r) {
-    const double p = horner(r, 0x3ec722bccc270959u, 0x3efa072e44b58159u, 0x3f2a019f7560fba3u,
-                            0x3f56c16b8144bd5bu, 0x3f811111111ac486u, 0x3fa55555556228ceu,
-                            0x3fc5555555555462u, 0x3fdffffffffffe76u, 0x3ff0000000000000u);
     const std::uint64_t odd = 0u - (shifted & 1u);
-    const std::uint64_t scale = (shifted << 51) ^ (odd & 0x000ea09e667f3bcdu);  // √2
     if constexpr (t == tier::ha) {
-      const double root_rest = value((odd & 0x80e182ab00000000u) ^ 0x3c6e51c500000000u);
-      return {scale, fma(p, r, root_rest)};
+      return {scale_of(shifted), fma(polynomial(r), r, root_rest(odd))};
     } else {
-      return {scale, p * r};
+      return {scale_of(shifted), polynomial(r) * r};
     }
+  }
+
+  LUMEN_MAIN exponential_factors with_rest(std::uint64_t shifted, double r, double r_low) {
+    const std::uint64_t odd = 0u - (shifted & 1u);
+    return {scale_of(shifted), fma(polynomial(r), r, root_rest(odd) + r_low)};
+  }
+
+  LUMEN_MAIN double polynomial(double r) {
+    return horner(r, 0x3ec722bccc270959u, 0x3efa072e44b58159u, 0x3f2a019f7560fba3u,
+                  0x3f56c16b8144bd5bu, 0x3f811111111ac486u, 0x3fa55555556228ceu,
+                  0x3fc5555555555462u, 0x3fdffffffffffe76u, 0x3ff0000000000000u);
+  }
+
+  LUMEN_MAIN std::uint64_t scale_of(std::uint64_t shifted) {
+    const std::uint64_t odd = 0u - (shifted & 1u);
+    return (shifted << 51) ^ (odd & 0x000ea09e667f3bcdu);  // √2
+  }
+
+  /// What the double √2, or 1, leaves out, relative to it.
+  LUMEN_MAIN double root_rest(std::uint64_t odd) {
+    return value((odd & 0x80e182ab00000000u) ^ 0x3c6e51c500000000u);
   }
 };
 

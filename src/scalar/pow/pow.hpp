@@ -21,7 +21,8 @@
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
 /// pow, float. Code 1 for zero to a negative power and for a negative number to a power that is no
-/// integer; code 3 for an overflow, code 4 for an underflow to zero.
+/// integer, code 3 for an infinite result of finite operands, code 4 for a zero one. Largest error
+/// 0.81, 3.1, 1880 ulp for `ha`, `la`, `ep`. At `la`, y = 0 and x = 1 give 1 + 2^-23.
 template <tier t>
 struct pow_paths_s : power_paths<float, row_power_s<t>, signed_specials_s, fixed_point_power> {};
 template <>
@@ -30,12 +31,15 @@ struct pow_paths_s<tier::ep>
 template <tier t>
 using pow_s = power_v21<float, pow_paths_s<t>>;
 
-/// pow, float, `la`, without a table on the main path. Status as above, but that a denormal result
-/// of the main path's last band
+/// pow, float, `la`, without a table on the main path. Largest error 1.2 ulp. Where
+/// 87.33654 < |y·ln x| <= 87.857, a denormal result is rounded twice.
 using pow_paths_s_nolut = power_paths<float, artanh_power_s, signed_specials_s, fixed_point_power>;
 using pow_s_nolut = power_v21<float, pow_paths_s_nolut>;
 
-/// pow, double.
+/// pow, double. Code 1 for zero to a negative power and for a negative number to a power that is no
+/// integer. Code 3 only where |y·log2 x| is 2^11 or more and the result infinite: other infinite
+/// results, zeros and denormals of finite operands have none. Largest error 0.57, 1.05, 1.3e8 ulp
+/// for `ha`, `la`, `ep`.
 template <typename Main>
 using pow_paths_d = power_paths<double, Main, signed_specials_d, careful_power_d>;
 template <tier t>
@@ -46,6 +50,8 @@ template <>
 struct pow_main_d<tier::ep> : quick_power_d {};
 template <tier t>
 using pow_d = power_v21<double, pow_paths_d<pow_main_d<t>>>;
+
+/// Without a table on the main path. Largest error 0.95, 1.3, 1.3 ulp for `ha`, `la`, `ep`.
 template <tier t>
 using pow_d_nolut = power_v21<double, pow_paths_d<nolut_power_d<t>>>;
 
