@@ -33,7 +33,7 @@ table rare_rows() {
       "__spow_ep_CoutTab",
       "Rare path of `ep`. Word i = 0..32: c1, 1/(1 + i/32) rounded to a multiple of 2^-10; word\n"
       "33 + 2i: -log2(c1), high word a multiple of 2^-15, and low word. Word 99 + i, i = 0..64:\n"
-      "c2, C/(1 + i/1024) up to i = 24 and C/(1 - (64 - i)/2048) above, of 14 bits, with\n"
+      "c2, C/(1 + i/1024) up to i = 24 and C/(1 - (64 - i)/2048) above, of 15 bits, with\n"
       "C = 1.44268798828125; word 164 + 2i: -log2(c2/C) in two words, of which the last is also\n"
       "the first of what follows. Word 293 + 2j, j = 0..31: low and high part of 2^(j/32). Word\n"
       "357 on the constants of the path: C; the coefficients of log2(1 + d/C) in d, the first\n"
@@ -56,7 +56,7 @@ table rare_rows() {
   const real scale = real::of_float(0x3fb8aa00);
   for (int i = 0; i <= 64; ++i) {
     const real m = i <= 24 ? real::ratio(1024 + i, 1024) : real::ratio(2048 - (64 - i), 2048);
-    const real c = (scale / m).rounded_to(14);
+    const real c = (scale / m).rounded_to(15);
     const real logarithm = -log2(c / scale);
     const real high(static_cast<double>(logarithm.to_float()));
     w.push_back(c.float_word());
