@@ -46,7 +46,7 @@ table rare_rows() {
   std::vector<std::uint64_t> pairs;
   for (int i = 0; i <= 32; ++i) {
     const real c = on_grid(real::ratio(32, 32 + i), -10);
-    const real logarithm = -log2(c);
+    const real logarithm = real(0) - log2(c);
     const real high = nearest_multiple(logarithm, -15);
     w.push_back(c.float_word());
     pairs.insert(pairs.end(), {high.float_word(), (logarithm - high).float_word()});
@@ -57,7 +57,7 @@ table rare_rows() {
   for (int i = 0; i <= 64; ++i) {
     const real m = i <= 24 ? real::ratio(1024 + i, 1024) : real::ratio(2048 - (64 - i), 2048);
     const real c = (scale / m).rounded_to(15);
-    const real logarithm = -log2(c / scale);
+    const real logarithm = real(0) - log2(c / scale);
     const real high(static_cast<double>(logarithm.to_float()));
     w.push_back(c.float_word());
     pairs.insert(pairs.end(), {high.float_word(), (logarithm - high).float_word()});
