@@ -69,7 +69,7 @@ LUMEN_DEVICE inline two_word_power three_stage_power(double x, double y) {
   const double log_high = s + low;
   const double log_low = low - (log_high - s);
 
-  // By the exponents alone: |y·log2 x| is 2^11 or more, or less than 2^-60.
+  // By the exponents alone: |y·log2 x| is at least 2^11, or less than 2^-60.
   const auto field = [](double u) { return static_cast<int>((bits(u) >> 52) & 0x7ff); };
   const int fields = field(log_high) + field(y);
   if (fields >= 0x809) {
@@ -97,7 +97,8 @@ LUMEN_DEVICE inline two_word_power three_stage_power(double x, double y) {
 }
 
 /// The same as the rare path at double. Largest error 0.53 ulp, denormal results included. Code 3
-/// only where |y·log2 x| is 2^11 or more; all other infinite, zero and denormal results have none.
+/// only where the exponents of y and log2 x tell that the result is infinite; others that come out
+/// infinite, zeros and denormals have none.
 struct careful_power_d {
   LUMEN_DEVICE static std::uint32_t of(double x, double y, std::uint64_t sign, double* r) {
     using range = two_word_power::range;
