@@ -122,10 +122,11 @@ struct fixed_point_power {
   LUMEN_DEVICE static std::uint32_t power_of_two(std::int32_t i, std::uint32_t f,
                                                  std::uint32_t sign, float* r) {
     const std::uint64_t fraction = f;
+    // (2^f - 1)·2^32, the last coefficient ln 2.
+    constexpr std::uint32_t coefficients[] = {0x95e83u,   0x580436u,   0x27607deu,
+                                              0xe359872u, 0x3d7f7977u, 0xb1721817u};
     std::uint64_t t = (fraction * 0x16b68u) >> 32;
-    for (const std::uint32_t c :
-         {0x95e83u, 0x580436u, 0x27607deu, 0xe359872u, 0x3d7f7977u, 0xb1721817u})
-      t = ((t + c) * fraction) >> 32;
+    for (const std::uint32_t c : coefficients) t = ((t + c) * fraction) >> 32;
     const auto root = static_cast<std::uint32_t>(t >> 1);
     const std::uint32_t rounded = root + 0x80u;
     int exponent = i + 127;

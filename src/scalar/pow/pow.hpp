@@ -39,7 +39,7 @@ using pow_s_nolut = power_v21<float, pow_paths_s_nolut>;
 /// pow, double. Code 1 for zero to a negative power and for a negative number to a power that is no
 /// integer. Code 3 only for an infinite result where the exponents of y and log2 x sum to 11 or
 /// more; other infinite results, zeros and denormals of finite operands have none. Largest error
-/// 0.52, 1.05, 1.29e8 ulp for `ha`, `la`, `ep`.
+/// 0.59, 1.05, 1.29e8 ulp for `ha`, `la`, `ep`.
 template <typename Main>
 using pow_paths_d = power_paths<double, Main, signed_specials_d, careful_power_d>;
 template <tier t>
@@ -51,7 +51,7 @@ struct pow_main_d<tier::ep> : quick_power_d {};
 template <tier t>
 using pow_d = power_v21<double, pow_paths_d<pow_main_d<t>>>;
 
-/// Without a table on the main path; one body for `la` and `ep`. Largest error 0.93, 1.33 ulp for
+/// Without a table on the main path; one body for `la` and `ep`. Largest error 0.95, 1.33 ulp for
 /// `ha`, `la`.
 template <tier t>
 using pow_d_nolut = power_v21<double, pow_paths_d<nolut_power_d<t>>>;

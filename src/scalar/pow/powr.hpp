@@ -38,7 +38,7 @@ using powr_s = power_v21<float, powr_of_tier_s<t>>;
 using powr_s_nolut = power_v21<float, powr_paths_s<wide_power_s, fixed_point_power>>;
 
 /// powr, double. Code 1 as at float. Code 3 only for an infinite result where the exponents of y
-/// and log2 x sum to 11 or more. One body for `ha` and `la`. Largest error 0.52 and, at
+/// and log2 x sum to 11 or more. One body for `ha` and `la`. Largest error 0.59 and, at
 /// `ep`, 1.29e8 ulp.
 template <typename Main>
 using powr_paths_d = power_paths<double, Main, nonnegative_specials<double>, careful_power_d>;
@@ -49,7 +49,7 @@ struct powr_main_d<tier::ep> : quick_power_d {};
 template <tier t>
 using powr_d = power_v21<double, powr_paths_d<powr_main_d<t>>>;
 
-/// Without a table on the main path; one body for `la` and `ep`. Largest error 0.93, 1.33 ulp for
+/// Without a table on the main path; one body for `la` and `ep`. Largest error 0.95, 1.33 ulp for
 /// `ha`, `la`.
 template <tier t>
 using powr_d_nolut = power_v21<double, powr_paths_d<nolut_power_d<t>>>;

@@ -28,8 +28,8 @@ struct special_power {
   }
 };
 
-/// The cases in which an operand is an infinity or x a zero, and neither a NaN, and for which a
-/// negative x does not count: y infinite, x = +infinity or ±0, y > 0.
+/// x to an infinite power, x no NaN; only its magnitude counts. Under -infinity zero is outside the
+/// domain.
 template <typename T>
 LUMEN_DEVICE constexpr special_power<T> power_by_infinity(T x, T y) {
   using s = special_power<T>;
@@ -89,9 +89,9 @@ struct signed_specials_d {
   }
 };
 
-/// powr. The sign of an operand zero or of a NaN counts: a base with its sign bit set, but for -0,
-/// is outside the domain, NaNs included. 0^0 is a NaN and outside the domain; a NaN to the power 0
-/// is a NaN; 1 to an infinite power is 1.
+/// powr. A base with its sign bit set, NaNs included and -0 not, is outside the domain, as is 0^0,
+/// the NaN of which has the signs' exclusive or. A NaN to the power 0 is a NaN; 1 to an infinite
+/// power is 1.
 template <typename T>
 struct nonnegative_specials {
   LUMEN_DEVICE static special_power<T> of(T x, T y) {
