@@ -29,9 +29,13 @@ constexpr std::int64_t sizes[] = {4096, std::int64_t{1} << 20};
 
 constexpr bench::arguments all_arguments[] = {
     {"acos", {{linear, -1, 1}}, {{linear, -1, 1}}},
+    {"acospi", {{linear, -1, 1}}, {{linear, -1, 1}}},
     {"asin", {{linear, -1, 1}}, {{linear, -1, 1}}},
+    {"asinpi", {{linear, -1, 1}}, {{linear, -1, 1}}},
     {"atan", {{linear, -10, 10}}, {{linear, -10, 10}}},
     {"atan2", {{linear, -10, 10}, {linear, -10, 10}}, {{linear, -10, 10}, {linear, -10, 10}}},
+    {"atan2pi", {{linear, -10, 10}, {linear, -10, 10}}, {{linear, -10, 10}, {linear, -10, 10}}},
+    {"atanpi", {{linear, -10, 10}}, {{linear, -10, 10}}},
     {"cbrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
     {"cos", {{linear, -100, 100}}, {{linear, -100, 100}}},
     {"div", {{linear, 1, 1000}, {linear, 1, 1000}}, {{linear, 1, 1000}, {linear, 1, 1000}}},
@@ -57,7 +61,11 @@ constexpr bench::arguments all_arguments[] = {
     {"powr",
      {{logarithmic, .01, 100}, {linear, -15, 15}},
      {{logarithmic, .01, 100}, {linear, -100, 100}}},
+    {"powx",
+     {{logarithmic, .01, 100}, {linear, -15, 15}},
+     {{logarithmic, .01, 100}, {linear, -100, 100}}},
     {"sin", {{linear, -100, 100}}, {{linear, -100, 100}}},
+    {"sincos", {{linear, -100, 100}}, {{linear, -100, 100}}},
     {"sqrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
     {"tan", {{linear, -100, 100}}, {{linear, -100, 100}}},
 };
@@ -69,6 +77,7 @@ const bench::arguments* arguments_of(std::string_view function) {
   return nullptr;
 }
 
+/// A second result goes behind the first one, to y + n.
 template <typename T>
 using array_function = void (*)(const T* const* in, T* y, std::int64_t n);
 
@@ -81,7 +90,7 @@ void add_one(const std::string& name, array_function<T> f, const interval* from,
                                  bench::make_special(x, kind);
                                  const std::vector<T> second = bench::draw<T>(from[1], n, 2);
                                  const T* const in[] = {x.data(), second.data()};
-                                 std::vector<T> y(static_cast<std::size_t>(n));
+                                 std::vector<T> y(2 * static_cast<std::size_t>(n));
                                  for (auto _ : state) {
                                    f(in, y.data(), n);
                                    benchmark::ClobberMemory();
@@ -113,7 +122,9 @@ void add(std::string_view function, char type, std::string_view implementation,
 /// Functors that share a body are timed once, under the label that comes first.
 template <typename Loop, typename T>
 void run_loop(const T* const* in, T* y, std::int64_t n) {
-  if constexpr (Loop::inputs == 1)
+  if constexpr (Loop::outputs == 2)
+    Loop::run(n, {in[0]}, {y, y + n});
+  else if constexpr (Loop::inputs == 1)
     Loop::run(n, {in[0]}, {y});
   else
     Loop::run(n, {in[0], in[1]}, {y});
@@ -125,7 +136,7 @@ void add_functor(std::string_view function, char type, std::string_view tier,
   using loop = scalar::block_loop_of<F>;
   if constexpr (!std::is_void_v<loop>) {
     using T = typename loop::input_type;
-    if constexpr (loop::outputs == 1 && std::is_same_v<T, typename loop::output_type> &&
+    if constexpr (std::is_same_v<T, typename loop::output_type> &&
                   (std::is_same_v<T, float> || std::is_same_v<T, double>)) {
       const array_function<T> run = &run_loop<loop, T>;
       if (!timed.insert(reinterpret_cast<const void*>(run)).second) return;

@@ -15,7 +15,7 @@ struct peer {
   std::string_view function;  ///< the catalogue's name
   char type;
   std::string_view implementation;
-  /// `n` is a multiple of the vector length. Exactly one of the two is set.
+  /// `n` is a multiple of the vector length; a second result goes to y + n. One of the two is set.
   void (*run_float)(const float* const* in, float* y, std::int64_t n);
   void (*run_double)(const double* const* in, double* y, std::int64_t n);
 };

@@ -2,11 +2,11 @@
 // SPDX-License-Identifier: Apache-2.0
 
 /// What an array library is for, on real data: the coordinates of the world's time zone cities in
-/// degrees, minutes and seconds, and how far each city's sun is from the clock of its zone.
+/// degrees, minutes and seconds, how far each city's sun is from the clock of its zone, the
+/// distances between all of them, and their places on a map.
 
 #include <CLI/CLI.hpp>
 #include <arbor/lumen/vm.hpp>
-#include <bit>
 #include <chrono>
 #include <cmath>
 #include <cstdint>
@@ -14,97 +14,104 @@
 #include <exception>
 #include <stdexcept>
 #include <string>
-#include <vector>
 
+#include "coordinates.hpp"
+#include "globe.hpp"
 #include "zone_table.hpp"
 
 namespace vm = arbor::lumen::vm;
 
 namespace {
 
-using column = std::vector<double>;
-
-/// Magnitudes of angles, taken apart.
-struct sexagesimal {
-  column degrees, minutes, seconds;
-};
-
-/// Added to a magnitude before it is cut, so that 31 minutes, which have no exact decimal degrees,
-/// do not come out as 30 minutes and 60 seconds: a nanodegree, 0.1 mm on the ground.
-constexpr double nudge = 1e-9;
-
-/// Degrees in decimals to degrees, minutes and seconds of arc, all in whole arrays.
-sexagesimal to_sexagesimal(sycl::queue& queue, const column& angle) {
-  const std::size_t n = angle.size();
-  const column sixty(n, 60.0);
-  column magnitude(n), fraction(n), rest(n);
-  sexagesimal result{column(n), column(n), column(n)};
-  vm::abs(queue, angle, magnitude);
-  vm::add(queue, magnitude, column(n, nudge), magnitude);
-  vm::trunc(queue, magnitude, result.degrees);
-  vm::frac(queue, magnitude, fraction);
-  vm::mul(queue, fraction, sixty, rest);
-  vm::trunc(queue, rest, result.minutes);
-  vm::frac(queue, rest, fraction);
-  vm::mul(queue, fraction, sixty, result.seconds);
-  return result;
+void print_row(const zone_table& cities, std::size_t i, const sexagesimal& latitude,
+               const sexagesimal& longitude, const column& offset, const map_points& points) {
+  std::printf(
+      "%-32s %3.0f° %02.0f' %04.1f\" %c  %3.0f° %02.0f' %04.1f\" %c  %+6.1f min  %+7.4f %+7.4f\n",
+      cities.name[i].c_str(), latitude.degrees[i], latitude.minutes[i], latitude.seconds[i],
+      cities.latitude[i] < 0 ? 'S' : 'N', longitude.degrees[i], longitude.minutes[i],
+      longitude.seconds[i], cities.longitude[i] < 0 ? 'W' : 'E', offset[i], points.east[i],
+      points.north[i]);
 }
 
-/// Minutes by which the mean sun is ahead of the clock: 4 for each degree east of the middle of the
-/// nearest zone of 15 degrees.
-column solar_offset(sycl::queue& queue, const column& longitude) {
-  const std::size_t n = longitude.size();
-  column offset(n);
-  vm::remainder(queue, longitude, column(n, 15.0), offset);
-  vm::mul(queue, offset, column(n, 4.0), offset);
-  return offset;
+void print_pair(const char* what, const zone_table& cities, pair_of_cities pair,
+                const column& distance) {
+  std::printf("  %-9s %s and %s, %.1f km\n", what, cities.name[pair.first].c_str(),
+              cities.name[pair.second].c_str(), distance[pair.first * cities.size() + pair.second]);
 }
 
-/// Compares with the same computation in plain C++, bit by bit.
-/// @throws std::runtime_error that names the city where they differ
-void check(const zone_table& cities, const column& angle, const sexagesimal& parts,
-           const column& longitude, const column& offset) {
-  const auto same = [](double a, double b) {
-    return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);
-  };
-  for (std::size_t i = 0; i < cities.size(); ++i) {
-    const double magnitude = std::fabs(angle[i]) + nudge;
-    const double rest = (magnitude - std::trunc(magnitude)) * 60.0;
-    const bool equal = same(parts.degrees[i], std::trunc(magnitude)) &&
-                       same(parts.minutes[i], std::trunc(rest)) &&
-                       same(parts.seconds[i], (rest - std::trunc(rest)) * 60.0) &&
-                       same(offset[i], std::remainder(longitude[i], 15.0) * 4.0);
-    if (!equal) throw std::runtime_error("results differ from plain C++ for " + cities.name[i]);
+/// Distances and map at each accuracy, each compared with long double.
+void show_globe(sycl::queue& queue, const zone_table& cities) {
+  struct {
+    const char* name;
+    vm::enums::mode mode;
+    double ulp;
+  } constexpr tiers[] = {{"ha", vm::enums::mode::ha, 1},
+                         {"la", vm::enums::mode::la, 4},
+                         {"ep", vm::enums::mode::ep, 0x1p27}};
+  std::printf("\n%zu distances, and how far they and the map are from long double:\n",
+              cities.size() * cities.size());
+  for (const auto& tier : tiers) {
+    const column distance = distances(queue, cities, tier.mode);
+    const map_points points = mercator(queue, cities, tier.mode);
+    const deviation off = check_globe(cities, distance, points, tier.ulp);
+    std::printf("  %s  at most %8.2g mm, %8.2g mm\n", tier.name, off.distance * 1e6,
+                off.map * 6371e6);
+    if (tier.mode != vm::enums::mode::ha) continue;
+    print_pair("closest", cities, closest(cities, distance), distance);
+    print_pair("farthest", cities, farthest(cities, distance), distance);
   }
 }
 
-void print_row(const zone_table& cities, std::size_t i, const sexagesimal& latitude,
-               const sexagesimal& longitude, const column& offset) {
-  std::printf("%-32s %3.0f° %02.0f' %04.1f\" %c  %3.0f° %02.0f' %04.1f\" %c  %+6.1f min\n",
-              cities.name[i].c_str(), latitude.degrees[i], latitude.minutes[i], latitude.seconds[i],
-              cities.latitude[i] < 0 ? 'S' : 'N', longitude.degrees[i], longitude.minutes[i],
-              longitude.seconds[i], cities.longitude[i] < 0 ? 'W' : 'E', offset[i]);
-}
-
-/// Elements per second of one function over a large array in the device's own memory.
-template <typename Call>
-void measure(sycl::queue& queue, const char* name, Call call) {
+/// Elements per second of one function over a large array in the device's own memory, beside a
+/// plain loop.
+template <typename Call, typename Plain>
+void measure(sycl::queue& queue, const char* name, Call call, Plain plain) {
   constexpr std::int64_t n = std::int64_t{1} << 22;
+  constexpr int runs = 5;
   double* a = sycl::malloc_device<double>(n, queue);
   double* b = sycl::malloc_device<double>(n, queue);
   double* y = sycl::malloc_device<double>(n, queue);
   if (a == nullptr || b == nullptr || y == nullptr)
     throw std::runtime_error("the device has no memory for a larger run");
-  queue.fill(a, 137.036, n);
+  queue.fill(a, 0.7297, n);
   queue.fill(b, 15.0, n).wait();
-  call(queue, n, a, b, y).wait_and_throw();  // the first run pays for pages and code
-  constexpr int runs = 5;
-  const auto start = std::chrono::steady_clock::now();
-  for (int run = 0; run < runs; ++run) call(queue, n, a, b, y).wait_and_throw();
-  const std::chrono::duration<double> time = std::chrono::steady_clock::now() - start;
-  std::printf("  %-10s %8.1f million elements per second\n", name,
-              static_cast<double>(n) * runs / time.count() / 1e6);
+  const auto rate = [&](auto run) {
+    run();  // the first run pays for pages and code
+    const auto start = std::chrono::steady_clock::now();
+    for (int i = 0; i < runs; ++i) run();
+    const std::chrono::duration<double> time = std::chrono::steady_clock::now() - start;
+    return static_cast<double>(n) * runs / time.count() / 1e6;
+  };
+  const double of_call = rate([&] { call(queue, n, a, b, y).wait_and_throw(); });
+  const column x(n, 0.7297);
+  column z(n);
+  const double of_loop = rate([&] {
+    for (std::size_t i = 0; i < x.size(); ++i) z[i] = plain(x[i]);
+  });
+  std::printf("  %-10s %8.1f %16.1f\n", name, of_call, of_loop);
   for (double* array : {a, b, y}) sycl::free(array, queue);
+}
+
+void measure_all(sycl::queue& queue) {
+  std::printf("\nMillion elements per second, 4194304 doubles in device memory:\n");
+  std::printf("  %-10s %8s %16s\n", "", "device", "plain std:: loop");
+  measure(
+      queue, "mul",
+      [](auto& q, auto n, auto* a, auto* b, auto* y) { return vm::mul(q, n, a, b, y); },
+      [](double x) { return x * 15.0; });
+  measure(
+      queue, "remainder",
+      [](auto& q, auto n, auto* a, auto* b, auto* y) { return vm::remainder(q, n, a, b, y); },
+      [](double x) { return std::remainder(x, 15.0); });
+  measure(
+      queue, "sin", [](auto& q, auto n, auto* a, auto*, auto* y) { return vm::sin(q, n, a, y); },
+      [](double x) { return std::sin(x); });
+  measure(
+      queue, "asin", [](auto& q, auto n, auto* a, auto*, auto* y) { return vm::asin(q, n, a, y); },
+      [](double x) { return std::asin(x); });
+  measure(
+      queue, "ln", [](auto& q, auto n, auto* a, auto*, auto* y) { return vm::ln(q, n, a, y); },
+      [](double x) { return std::log(x); });
 }
 
 void run_on(const sycl::device& device, const zone_table& cities, bool all) {
@@ -113,30 +120,26 @@ void run_on(const sycl::device& device, const zone_table& cities, bool all) {
   const sexagesimal latitude = to_sexagesimal(queue, cities.latitude);
   const sexagesimal longitude = to_sexagesimal(queue, cities.longitude);
   const column offset = solar_offset(queue, cities.longitude);
-  check(cities, cities.latitude, latitude, cities.longitude, offset);
-  check(cities, cities.longitude, longitude, cities.longitude, offset);
+  check_coordinates(cities, cities.latitude, latitude, cities.longitude, offset);
+  check_coordinates(cities, cities.longitude, longitude, cities.longitude, offset);
+  const map_points points = mercator(queue, cities, vm::enums::mode::ha);
 
-  std::printf("%-32s %-16s  %-16s  %s\n", "zone", "latitude", "longitude", "sun ahead of clock");
+  std::printf("%-32s %-16s  %-16s  %-11s Mercator: east, north\n", "zone", "latitude", "longitude",
+              "sun - clock");
   const std::size_t step = all ? 1 : (cities.size() + 11) / 12;
   for (std::size_t i = 0; i < cities.size(); i += step)
-    print_row(cities, i, latitude, longitude, offset);
-  std::printf("\n%zu cities, all results equal to plain C++ bit by bit.\n", cities.size());
-
-  std::printf("Larger runs, 4194304 elements of double in device memory:\n");
-  const auto mul = [](auto&... args) { return vm::mul(args...); };
-  const auto remainder = [](auto&... args) { return vm::remainder(args...); };
-  const auto trunc = [](sycl::queue& q, std::int64_t n, double* a, double*, double* y) {
-    return vm::trunc(q, n, a, y);
-  };
-  measure(queue, "trunc", trunc);
-  measure(queue, "mul", mul);
-  measure(queue, "remainder", remainder);
+    print_row(cities, i, latitude, longitude, offset, points);
+  std::printf("\n%zu cities, coordinates and times equal to plain C++ bit by bit.\n",
+              cities.size());
+  show_globe(queue, cities);
+  measure_all(queue);
 }
 
 }  // namespace
 
 int main(int argc, char** argv) {
-  CLI::App app("Coordinates and solar time of the world's time zone cities, on each device");
+  CLI::App app(
+      "Coordinates, solar time, distances and map of the world's time zone cities, on each device");
   std::string file = "/usr/share/zoneinfo/zone1970.tab";
   bool all = false;
   app.add_option("file", file, "table of cities in the format of tzdata's zone1970.tab")
