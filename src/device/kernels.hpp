@@ -14,6 +14,7 @@
 #include "call/input.hpp"
 #include "device/fixup.hpp"
 #include "device/strided_args.hpp"
+#include "scalar/block_loop.hpp"
 
 /// The three kernels of every functor. Kernels do no mathematics: they find the elements of one
 /// work item, call the functor and deal with the status that it returns.
@@ -28,6 +29,11 @@ struct needs_nothing {};
 template <typename Functor>
 using requirements = std::conditional_t<Functor::needs_fp64, needs_fp64, needs_nothing>;
 
+/// A functor on halves, in arrays of `T`, that has a loop over blocks.
+template <typename Functor, typename T, typename U>
+concept has_half_loop = scalar::half_element<T> && std::is_same_v<T, U> &&
+    !std::is_void_v<scalar::half_block_loop_of<Functor, T>>;
+
 namespace usm {
 
 /// Contiguous elements, status dropped: no branch but the functor's own.
@@ -40,7 +46,22 @@ struct linear : requirements<Functor> {
     run(item[0], input_indices<Shape>{}, output_indices<Shape>{});
   }
 
+  /// The embedded runtime runs stretches of items by this where it is offered: halves in blocks,
+  /// whose conversions are vectorised.
+  void lumen_run_items(std::size_t begin,
+                       std::size_t end) const requires has_half_loop<Functor, T, U> {
+    run_blocks(begin, end, input_indices<Shape>{}, output_indices<Shape>{});
+  }
+
  private:
+  template <std::size_t... I, std::size_t... O>
+  void run_blocks(std::size_t begin, std::size_t end, std::index_sequence<I...>,
+                  std::index_sequence<O...>) const {
+    scalar::half_block_loop_of<Functor, T>::run(static_cast<std::int64_t>(end - begin),
+                                                {args_.in[I] + begin...},
+                                                {args_.out[O] + begin...});
+  }
+
   template <std::size_t... I, std::size_t... O>
   void run(std::size_t i, std::index_sequence<I...>, std::index_sequence<O...>) const {
     call_functor<Shape, Functor, T, U>({&args_.in[I][i]...}, args_.constants.data(), i,

@@ -7,9 +7,11 @@
 #pragma once
 
 #include <algorithm>
+#include <concepts>
 #include <cstdint>
 #include <type_traits>
 
+#include "scalar/half.hpp"
 #include "scalar/protocol.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
@@ -152,5 +154,68 @@ void block_loop_by_base(...);
 
 template <typename Functor>
 using block_loop_of = decltype(block_loop_by_base(static_cast<const Functor*>(nullptr)));
+
+/// A body on floats as a body on halves.
+template <typename Body, half_element Element>
+struct on_halves {
+  template <std::same_as<Element>... Operands>
+  LUMEN_MAIN auto main(Operands... x) {
+    const auto result = Body::main(load_half(&x)...);
+    if constexpr (requires { result.second; }) {
+      main_result2<Element> narrowed{{}, {}, result.rare};
+      store_half(&narrowed.first, result.first);
+      store_half(&narrowed.second, result.second);
+      return narrowed;
+    } else {
+      main_result<Element> narrowed{{}, result.rare};
+      store_half(&narrowed.value, result.value);
+      return narrowed;
+    }
+  }
+
+  static std::uint32_t rare(Element x, Element* y) requires requires(float a) { Body::rare(a, &a); }
+  {
+    float result;
+    const std::uint32_t status = Body::rare(load_half(&x), &result);
+    store_half(y, result);
+    return status;
+  }
+  static std::uint32_t rare(Element a, Element b, Element* y) requires requires(float x) {
+    Body::rare(x, x, &x);
+  }
+  {
+    float result;
+    const std::uint32_t status = Body::rare(load_half(&a), load_half(&b), &result);
+    store_half(y, result);
+    return status;
+  }
+  static std::uint32_t rare(Element x, Element* y, Element* z) requires requires(float a) {
+    Body::rare(a, &a, &a);
+  }
+  {
+    float first, second;
+    const std::uint32_t status = Body::rare(load_half(&x), &first, &second);
+    store_half(y, first);
+    store_half(z, second);
+    return status;
+  }
+};
+
+/// The same for functors on halves, in arrays of `Element`.
+template <typename Element, typename Body>
+block_loop<on_halves<Body, Element>, Element, Element, 1, 1> half_block_loop_by_base(
+    const half_v11<Body>*);
+template <typename Element, typename Body>
+block_loop<on_halves<Body, Element>, Element, Element, 1, 2> half_block_loop_by_base(
+    const half_v12<Body>*);
+template <typename Element, typename Body>
+block_loop<on_halves<Body, Element>, Element, Element, 2, 1> half_block_loop_by_base(
+    const half_v21<Body>*);
+template <typename Element>
+void half_block_loop_by_base(...);
+
+template <typename Functor, typename Element>
+using half_block_loop_of =
+    decltype(half_block_loop_by_base<Element>(static_cast<const Functor*>(nullptr)));
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar

@@ -80,6 +80,11 @@ template <typename Element>
 concept half_element = sizeof(Element) == 2 && std::is_trivially_copyable_v<Element>;
 
 template <half_element Element>
+struct rare_flag<Element> {
+  using type = std::uint32_t;
+};
+
+template <half_element Element>
 LUMEN_MAIN float load_half(const Element* a) {
   return widen(std::bit_cast<binary16>(*a));
 }

@@ -47,11 +47,15 @@ void run_loop(const void* const* in, void* const* out, std::size_t n) {
 
 template <typename F>
 constexpr decltype(functor::run_loop) loop_of() {
-  using loop = scalar::block_loop_of<F>;
-  if constexpr (std::is_void_v<loop>)
-    return nullptr;
-  else
-    return &run_loop<loop>;
+  using T = typename F::input_type;
+  if constexpr (std::is_same_v<T, scalar::binary16>) {
+    using loop = scalar::half_block_loop_of<F, T>;
+    if constexpr (!std::is_void_v<loop>) return &run_loop<loop>;
+  } else {
+    using loop = scalar::block_loop_of<F>;
+    if constexpr (!std::is_void_v<loop>) return &run_loop<loop>;
+  }
+  return nullptr;
 }
 
 constexpr functor all_functors[] = {

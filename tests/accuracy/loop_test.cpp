@@ -26,7 +26,9 @@ std::vector<functor> functors_with_loop() {
 }
 
 /// Bytes of a number, of both numbers of a complex one.
-std::size_t part_size(const functor& f) { return f.type == 's' || f.type == 'c' ? 4 : 8; }
+std::size_t part_size(const functor& f) {
+  return f.type == 'h' ? 2 : (f.type == 's' || f.type == 'c' ? 4 : 8);
+}
 std::size_t element_size(const functor& f) { return part_size(f) * (f.is_real() ? 1 : 2); }
 
 /// Any patterns, every third number of ordinary size, every seventh special.
@@ -35,7 +37,10 @@ std::vector<unsigned char> operands(const functor& f, std::size_t n, std::uint64
   std::vector<unsigned char> bytes(n * element_size(f));
   for (std::size_t at = 0; at < bytes.size(); at += part_size(f)) {
     const std::uint64_t drawn = engine();
-    if (part_size(f) == 4) {
+    if (part_size(f) == 2) {
+      const auto pattern = static_cast<std::uint16_t>(drawn);
+      std::memcpy(&bytes[at], &pattern, 2);
+    } else if (part_size(f) == 4) {
       static constexpr std::uint32_t specials[] = {0, 1, 0x7f800000, 0x7fc00000, 0x007fffff};
       auto pattern = static_cast<std::uint32_t>(drawn);
       if (drawn % 3 == 0) pattern = (pattern & 0x80ffffff) | 0x3f000000;
@@ -54,6 +59,11 @@ std::vector<unsigned char> operands(const functor& f, std::size_t n, std::uint64
 }
 
 bool is_nan(const functor& f, const unsigned char* number) {
+  if (part_size(f) == 2) {
+    std::uint16_t pattern;
+    std::memcpy(&pattern, number, 2);
+    return (pattern & 0x7fff) > 0x7c00;
+  }
   if (part_size(f) == 4) {
     float x;
     std::memcpy(&x, number, 4);

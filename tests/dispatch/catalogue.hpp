@@ -46,11 +46,24 @@ struct catalogued_row {
 };
 
 inline const std::vector<catalogued_row>& catalogued_rows() {
-  static const std::vector<catalogued_row> rows{
+  // As constants first: a list of as many strings takes compilers a minute.
+  struct row {
+    const char* function;
+    char type;
+    const char* feature;
+    bool cast;
+    const char* tier;
+  };
+  static constexpr row constants[] = {
 #define LUMEN_ROW(function, type, feature, cast, tier) {#function, #type[0], #feature, cast, #tier},
       LUMEN_ROWS(LUMEN_ROW)
 #undef LUMEN_ROW
   };
+  static const std::vector<catalogued_row> rows = [] {
+    std::vector<catalogued_row> list;
+    for (const row& r : constants) list.push_back({r.function, r.type, r.feature, r.cast, r.tier});
+    return list;
+  }();
   return rows;
 }
 

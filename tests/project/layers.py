@@ -16,7 +16,7 @@ PUBLIC = {"arbor", "sycl"}
 LAYERS = {
     "scalar": set(),
     "call": PUBLIC,
-    "device": PUBLIC | {"call"},
+    "device": PUBLIC | {"call", "scalar"},
     "host": PUBLIC | {"call", "device"},
     "dispatch": PUBLIC | {"call", "device", "host", "scalar"},
     "frontend": PUBLIC | {"call", "dispatch"},

@@ -8,20 +8,33 @@ from catalogue import Function
 from output import Output
 
 
+def _compiled(function: Function) -> dict[str, str]:
+    """For each functor the one whose kernels it runs: functors with one body share the kernels of
+    the first of them, unless they ask different things of a device."""
+    first: dict[tuple[str, str, bool], str] = {}
+    return {
+        functor.name: first.setdefault((functor.type, functor.body, functor.needs_fp64), functor.name)
+        for functor in function.functors
+        if functor.body
+    }
+
+
 def _rows(function: Function) -> list[str]:
     rows = []
+    compiled = _compiled(function)
     for functor in function.functors:
         if functor.body:
             # Bodies know halves as patterns; kernels, as the arrays hold them.
             elements = ", sycl::half, sycl::half" if functor.type == "h" else ""
-            arguments = f"shape::{function.shape}, scalar::{functor.name}{elements}"
+            arguments = f"shape::{function.shape}, scalar::{compiled[functor.name]}{elements}"
             launcher = f"&gpu::norvane::launcher<{arguments}>"
             rows.extend(f'      {{0x{key:x}, {launcher}, "{functor.name}"}},'
                         for key in functor.keys)
     for row in function.host_rows:
         functor = function.host_functor(row)
         if functor:
-            executor = f"&cpu::norvane::loop_launcher<shape::{function.shape}, scalar::{functor.name}>"
+            loop = f"shape::{function.shape}, scalar::{compiled[functor.name]}"
+            executor = f"&cpu::norvane::loop_launcher<{loop}>"
             rows.append(f'      {{0x{row.key:x}, {executor}, "host loop over {functor.name}"}},')
     return rows
 

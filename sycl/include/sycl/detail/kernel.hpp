@@ -29,7 +29,9 @@ template <typename Kernel, int Dimensions>
 void run_range(const void* closure, const std::size_t* extents, std::size_t begin,
                std::size_t end) {
   kernel_view<Kernel> kernel = *static_cast<const Kernel*>(closure);
-  if constexpr (Dimensions == 1) {
+  if constexpr (Dimensions == 1 && requires { kernel.lumen_run_items(begin, end); }) {
+    kernel.lumen_run_items(begin, end);
+  } else if constexpr (Dimensions == 1) {
     const range<1> shape(extents[0]);
     for (std::size_t i = begin; i < end; ++i) kernel(make_item<1>(shape, id<1>(i)));
   } else {
