@@ -3,7 +3,9 @@
 
 #include "functor.hpp"
 
-#include "scalar/block_loop.hpp"
+#include <vector>
+
+#include "functor_loops.hpp"
 #include "scalar/functors.hpp"
 #include "scalar/generated/list.hpp"
 
@@ -14,6 +16,30 @@ namespace {
 namespace scalar = vm::detail::gpu::norvane::scalar;
 
 enum class shape { v11, v12, v21, v21c };
+
+/// The base of a functor that its call comes from, so that functors with one body are compiled
+/// once; a functor with a call of its own is its own base.
+template <typename F>
+struct called {
+  template <typename Body, typename T, typename U>
+  static scalar::scalar_v11<Body, T, U> find(const scalar::scalar_v11<Body, T, U>*);
+  template <typename Body, typename T, typename U>
+  static scalar::scalar_v12<Body, T, U> find(const scalar::scalar_v12<Body, T, U>*);
+  template <typename Body, typename T, typename U>
+  static scalar::scalar_v21<Body, T, U> find(const scalar::scalar_v21<Body, T, U>*);
+  template <typename Body, typename T, typename U>
+  static scalar::scalar_v21c<Body, T, U> find(const scalar::scalar_v21c<Body, T, U>*);
+  template <typename Body>
+  static scalar::half_v11<Body> find(const scalar::half_v11<Body>*);
+  template <typename Body>
+  static scalar::half_v12<Body> find(const scalar::half_v12<Body>*);
+  template <typename Body>
+  static scalar::half_v21<Body> find(const scalar::half_v21<Body>*);
+  template <typename Body>
+  static scalar::half_v21c<Body> find(const scalar::half_v21c<Body>*);
+  static F find(...);
+  using base = decltype(find(static_cast<const F*>(nullptr)));
+};
 
 template <typename F, shape S>
 void run(const void* const* in, void* const* out, std::uint32_t* status, std::size_t n) {
@@ -34,50 +60,34 @@ void run(const void* const* in, void* const* out, std::uint32_t* status, std::si
   }
 }
 
-template <typename Loop>
-void run_loop(const void* const* in, void* const* out, std::size_t n) {
-  using T = typename Loop::input_type;
-  using U = typename Loop::output_type;
-  const T* a[Loop::inputs];
-  U* y[Loop::outputs];
-  for (int k = 0; k < Loop::inputs; ++k) a[k] = static_cast<const T*>(in[k]);
-  for (int k = 0; k < Loop::outputs; ++k) y[k] = static_cast<U*>(out[k]);
-  Loop::run(static_cast<std::int64_t>(n), a, y);
-}
-
-template <typename F>
-constexpr decltype(functor::run_loop) loop_of() {
-  using T = typename F::input_type;
-  if constexpr (std::is_same_v<T, scalar::binary16>) {
-    using loop = scalar::half_block_loop_of<F, T>;
-    if constexpr (!std::is_void_v<loop>) return &run_loop<loop>;
-  } else {
-    using loop = scalar::block_loop_of<F>;
-    if constexpr (!std::is_void_v<loop>) return &run_loop<loop>;
-  }
-  return nullptr;
-}
-
-constexpr functor all_functors[] = {
+std::vector<functor> make_functors() {
+  std::vector<functor> list = {
 #define LUMEN_ROW(function, form, type, tier, label, name) \
-  {#name,                                                  \
-   #function,                                              \
-   #form,                                                  \
-   #type[0],                                               \
-   #tier,                                                  \
-   #label,                                                 \
-   &run<scalar::name, shape::form>,                        \
-   loop_of<scalar::name>()},
-    LUMEN_FUNCTORS(LUMEN_ROW)
+  {                                                        \
+      #name,                                               \
+      #function,                                           \
+      #form,                                               \
+      #type[0],                                            \
+      #tier,                                               \
+      #label,                                              \
+      &run<called<scalar::name>::base, shape::form>,       \
+      nullptr},
+      LUMEN_FUNCTORS(LUMEN_ROW)
 #undef LUMEN_ROW
-};
+  };
+  for (std::size_t i = 0; i < list.size(); ++i) list[i].run_loop = functor_loops()[i];
+  return list;
+}
 
 }  // namespace
 
-std::span<const functor> functors() { return all_functors; }
+std::span<const functor> functors() {
+  static const std::vector<functor> list = make_functors();
+  return list;
+}
 
 const functor* find_functor(std::string_view name) {
-  for (const functor& f : all_functors) {
+  for (const functor& f : functors()) {
     if (f.name == name) return &f;
   }
   return nullptr;
