@@ -25,7 +25,7 @@ constexpr std::int64_t n = std::int64_t{1} << 20;
 /// Arguments that are ordinary for every function: between 1 and 2, never equal in two arrays.
 template <typename T>
 T ordinary(std::int64_t i, int array) {
-  return T(1.0 + 0.25 * array + 0.5 * static_cast<double>(i % 1000) / 1000.0);
+  return T(static_cast<float>(1.0 + 0.25 * array + 0.5 * static_cast<double>(i % 1000) / 1000.0));
 }
 
 template <typename T>
@@ -88,6 +88,7 @@ void add(const detail::family& family, const std::string& letter) {
 
 int main(int argc, char** argv) {
   for (const detail::family& family : detail::families()) {
+    add<sycl::half, sycl::half>(family, "h");
     add<float, float>(family, "s");
     add<double, double>(family, "d");
     if (std::string(family.name) == "abs") {

@@ -40,7 +40,8 @@ struct hypot_s : scalar_v21<hypot_s<t>, float> {
     const float z = fma(h, d, g);
     const float root = fma(z, value(0x7f000000u - scale), 0.0f);
     const float finite = select(s == 0, 0.0f, root);
-    const bool infinite = is_infinite(x) | is_infinite(y);
+    const bool infinite_x = is_infinite(x), infinite_y = is_infinite(y);
+    const bool infinite = infinite_x | infinite_y;
     const float special = select(infinite, value(format<float>::special), x + y);
     return {select(is_special(larger), special, finite)};
   }

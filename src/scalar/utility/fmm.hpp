@@ -18,8 +18,9 @@ struct fmm_body {
   using input_type = T;
   using output_type = T;
   LUMEN_DEVICE static std::uint32_t call(const T* a, const T* b, const T* c, T* y) {
-    const auto product = special::impl::multiply3_156(
-        bits(static_cast<double>(*a)), bits(static_cast<double>(*b)), bits(static_cast<double>(*c)));
+    const auto product =
+        special::impl::multiply3_156(bits(static_cast<double>(*a)), bits(static_cast<double>(*b)),
+                                     bits(static_cast<double>(*c)));
     *y = static_cast<T>(value(product.pattern));
     return product.code;
   }
