@@ -8,10 +8,13 @@ error is near the smallest of the degree. Computed in decimal arithmetic; a coef
 to the nearest double.
 """
 
+import sys
 from decimal import Decimal, getcontext
 from pathlib import Path
-import math
-import struct
+
+FOLDER = Path(__file__).resolve().parent.parent
+sys.path.insert(0, str(FOLDER.parent / "fit"))
+from fitting import Array, chebyshev_zeros, doubles, evaluate, interpolate, write_header  # noqa: E402
 
 getcontext().prec = 60
 
@@ -37,50 +40,22 @@ def target(z: Decimal) -> Decimal:
     return arctan(t) / (t * PI) if z != 0 else 1 / PI
 
 
-def interpolate(points: list[Decimal], function) -> list[Decimal]:
-    """Coefficients, lowest first, by Newton's divided differences."""
-    table = [function(x) for x in points]
-    for level in range(1, len(points)):
-        for i in range(len(points) - 1, level - 1, -1):
-            table[i] = (table[i] - table[i - 1]) / (points[i] - points[i - level])
-    result = [Decimal(0)] * len(points)
-    for i in range(len(points) - 1, -1, -1):
-        # result = result·(x - points[i]) + table[i]
-        shifted = [Decimal(0)] + result[:-1]
-        result = [s - points[i] * r for s, r in zip(shifted, result)]
-        result[0] += table[i]
-    return result
-
-
-def evaluate(coefficients: list[float], x: Decimal) -> Decimal:
-    value = Decimal(0)
-    for c in reversed(coefficients):
-        value = value * x + Decimal(c)
-    return value
-
-
-def pattern(x: float) -> str:
-    return "0x%016x" % struct.unpack("<Q", struct.pack("<d", x))[0]
-
-
 def main() -> None:
-    count = DEGREE + 1
-    angles = [(2 * i + 1) * math.pi / (2 * count) for i in range(count)]
-    nodes = [(1 + Decimal(math.cos(angle))) / 2 for angle in angles]
-    coefficients = [float(c) for c in interpolate(nodes, target)]
+    nodes = [(1 + zero) / 2 for zero in chebyshev_zeros(DEGREE + 1)]
+    coefficients = doubles(interpolate(nodes, target))
     samples = [Decimal(i) / 1000 for i in range(1001)]
     error = max(abs(evaluate(coefficients, z) / target(z) - 1) for z in samples)
-
-    text = "// SPDX-FileCopyrightText: The Arbor Lumen authors\n"
-    text += "// SPDX-License-Identifier: Apache-2.0\n"
-    text += "//\n// Written by fit/arctangent_over_pi.py.\n\n#pragma once\n\n#include <cstdint>\n\n"
-    text += "namespace arbor::lumen::vm::detail::gpu::norvane::scalar {\n\n"
-    text += f"/// Lowest first: arctan(t)/(pi t) in z = t^2 on [0, 1], within {error:.1e} relative.\n"
-    text += f"static constexpr std::uint64_t arctangent_over_pi_coefficients[{count}] = {{\n"
-    text += "".join(f"    {pattern(c)},  // {c!r}\n" for c in coefficients)
-    text += "};\n\n}  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar\n"
-    path = Path(__file__).resolve().parent.parent / "arctangent_over_pi_constants.hpp"
-    path.write_text(text, encoding="utf-8")
+    write_header(
+        FOLDER / "arctangent_over_pi_constants.hpp",
+        __file__,
+        [
+            Array(
+                "arctangent_over_pi_coefficients",
+                f"Lowest first: arctan(t)/(pi t) in z = t^2 on [0, 1], within {error:.1e} relative.",
+                coefficients,
+            )
+        ],
+    )
 
 
 if __name__ == "__main__":

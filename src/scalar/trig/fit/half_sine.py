@@ -10,10 +10,14 @@ relative error of the sine vanishes.
 Computed in decimal arithmetic; a coefficient is rounded to the nearest float.
 """
 
+import math
+import sys
 from decimal import Decimal, getcontext
 from pathlib import Path
-import math
-import struct
+
+FOLDER = Path(__file__).resolve().parent.parent
+sys.path.insert(0, str(FOLDER.parent / "fit"))
+from fitting import Array, evaluate, floats, interpolate, write_header  # noqa: E402
 
 getcontext().prec = 60
 
@@ -35,25 +39,6 @@ def cubic(z: Decimal) -> Decimal:
     return (sine(r) - r) / (r * z)
 
 
-def interpolate(points: list[Decimal]) -> list[Decimal]:
-    """Coefficients, lowest first, by Newton's divided differences."""
-    table = [cubic(x) for x in points]
-    for level in range(1, len(points)):
-        for i in range(len(points) - 1, level - 1, -1):
-            table[i] = (table[i] - table[i - 1]) / (points[i] - points[i - level])
-    result = [Decimal(0)] * len(points)
-    for i in range(len(points) - 1, -1, -1):
-        shifted = [Decimal(0)] + result[:-1]
-        result = [s - points[i] * r for s, r in zip(shifted, result)]
-        result[0] += table[i]
-    return result
-
-
-def to_float(x: Decimal) -> float:
-    """The nearest float: the double next to x does not lie on a tie of floats."""
-    return struct.unpack("<f", struct.pack("<f", float(x)))[0]
-
-
 def main() -> None:
     # The error of the sine carries a factor z more, as if 0 were another node.
     top = LIMIT * LIMIT
@@ -62,39 +47,26 @@ def main() -> None:
     nodes = [
         scale * Decimal(math.cos((2 * i + 1) * angle) + math.cos(angle)) for i in range(COUNT)
     ]
-    coefficients = [to_float(c) for c in interpolate(nodes)]
+    coefficients = floats(interpolate(nodes, cubic))
 
     error = Decimal(0)
     for i in range(1, 2001):
         r = LIMIT * i / 2000
         z = r * r
-        p = Decimal(0)
-        for c in reversed(coefficients):
-            p = p * z + Decimal(c)
-        error = max(error, abs((r + r * z * p) / sine(r) - 1))
-
-    lines = "".join(
-        "    0x%08x,  // %.9g\n" % (struct.unpack("<I", struct.pack("<f", c))[0], c)
-        for c in coefficients
+        error = max(error, abs((r + r * z * evaluate(coefficients, z)) / sine(r) - 1))
+    write_header(
+        FOLDER / "half_sine_constants.hpp",
+        __file__,
+        [
+            Array(
+                "half_sine_cubic",
+                f"Lowest first: (sin r - r)/r^3 in r^2 for |r| <= {LIMIT}; of the sine within"
+                f" {error:.1e} relative.",
+                coefficients,
+                bits=32,
+            )
+        ],
     )
-    text = f"""// SPDX-FileCopyrightText: The Arbor Lumen authors
-// SPDX-License-Identifier: Apache-2.0
-//
-// Written by fit/half_sine.py.
-
-#pragma once
-
-#include <cstdint>
-
-namespace arbor::lumen::vm::detail::gpu::norvane::scalar {{
-
-/// Lowest first: (sin r - r)/r^3 in r^2 for |r| <= {LIMIT}; of the sine within {error:.1e} relative.
-static constexpr std::uint32_t half_sine_cubic[{COUNT}] = {{
-{lines}}};
-
-}}  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
-"""
-    (Path(__file__).resolve().parent.parent / "half_sine_constants.hpp").write_text(text)
 
 
 if __name__ == "__main__":
