@@ -27,8 +27,6 @@ struct arguments {
   interval of_float[2], of_double[2];
 };
 
-inline constexpr interval none{spacing::linear, 1, 2};
-
 /// Random arguments: uniform in value, or in the logarithm of it.
 template <typename T>
 std::vector<T> draw(const interval& from, std::int64_t n, std::uint64_t seed) {

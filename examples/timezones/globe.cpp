@@ -38,12 +38,15 @@ column products_of_pairs(sycl::queue& queue, const column& x) {
   return y;
 }
 
-/// The square of the sine of half the angle between two cities, by the haversine formula, and what
-/// rounding may change of the angle.
+/// A result in long double, and what rounding may change of it where every function has an error of
+/// at most `ulp` units in the last place.
 struct reference {
-  long double angle;
+  long double value;
   long double bound;
 };
+
+/// The angle between two cities by the haversine formula: the square of the sine of its half is
+/// sin²(Δφ/2) + cos φ₁ cos φ₂ sin²(Δλ/2).
 reference angle_between(const zone_table& cities, std::size_t i, std::size_t j, long double ulp) {
   const long double unit = std::numeric_limits<double>::epsilon() / 2;
   const long double scale = std::numbers::pi_v<long double> / 180;
@@ -63,7 +66,7 @@ reference angle_between(const zone_table& cities, std::size_t i, std::size_t j, 
   return {2 * angle, 2 * unit * (slope * (of_coordinates + of_root) + of_angle)};
 }
 
-/// The same for the ordinate ln tan(π/4 + φ/2) of the map.
+/// The ordinate ln tan(π/4 + φ/2) of the map.
 reference ordinate(double latitude, long double ulp) {
   const long double unit = std::numeric_limits<double>::epsilon() / 2;
   const long double half = latitude * std::numbers::pi_v<long double> / 360;
@@ -107,7 +110,7 @@ deviation check_globe(const zone_table& cities, const column& distance, const ma
   deviation largest{0, 0};
   const std::size_t n = cities.size();
   const auto off = [&](double result, const reference& r, long double scale, std::size_t city) {
-    const long double difference = std::fabs(result - r.angle * scale);
+    const long double difference = std::fabs(result - r.value * scale);
     if (!(difference <= r.bound * scale))
       throw std::runtime_error("too far from the result in long double for " + cities.name[city]);
     return static_cast<double>(difference);

@@ -102,7 +102,7 @@ struct half_step_factors_d {
 /// results of ±infinity included.
 ///
 /// `ha` and `la` reduce to half-integers; `ep` takes the first step of the reduction in float, to
-/// integers, with a polynomial of degree 6. Largest error 0.92, 1.25, 1.7e7 ulp.
+/// integers, with a polynomial of degree 6. Largest error 0.94, 1.28, 1.7e7 ulp.
 template <tier t>
 struct exp_d : scalar_v11<exp_d<t>, double> {
   LUMEN_MAIN main_result<double> main(double x) {

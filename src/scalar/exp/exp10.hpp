@@ -32,7 +32,7 @@ using exp10_s = half_step_power<decimal_base_s>;
 ///
 /// x·log2 10 = k + i/128 + a rest, 2^(i/128) from a table, at `ha` from a table of pairs; `ep`
 /// reduces to integers and has no table. The rare path, one for all tiers, has a table of 64 pairs
-/// and rounds a denormal result once. Largest error 0.51, 1.0, 2.8e7 ulp for `ha`, `la`, `ep`, and
+/// and rounds a denormal result once. Largest error 0.52, 1.0, 2.8e7 ulp for `ha`, `la`, `ep`, and
 /// 0.53 on the rare path.
 template <tier t>
 struct exp10_d : scalar_v11<exp10_d<t>, double> {

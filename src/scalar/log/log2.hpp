@@ -153,7 +153,7 @@ struct log2_d<tier::ha> : scalar_v11<log2_d<tier::ha>, double> {
 };
 
 /// log2, double, without a table; one body for `la` and `ep`. Code 1 also for a NaN with its sign
-/// bit set. Largest error 1.8 ulp.
+/// bit set. Largest error 1.81 ulp.
 struct log2_d_nolut : scalar_v11<log2_d_nolut, double> {
   LUMEN_MAIN main_result<double> main(double x) {
     const auto a = two_thirds<double>::of(x);
