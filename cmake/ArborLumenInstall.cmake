@@ -4,8 +4,10 @@
 # Installs the library, its headers, a CMake package and a pkg-config file.
 include(CMakePackageConfigHelpers)
 
-install(TARGETS arbor_lumen_vm arbor_lumen_sycl_dependency EXPORT ArborLumenTargets
+install(TARGETS arbor_lumen_vm arbor_lumen_sycl_dependency lumen_serv EXPORT ArborLumenTargets
         LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
+# Loaded by name, from the folder of lumen_serv.
+install(TARGETS lumen_arr LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR})
 if(TARGET arbor_lumen_vm_v3)
   install(TARGETS arbor_lumen_vm_v3
           LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR}/glibc-hwcaps/x86-64-v3)

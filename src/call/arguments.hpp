@@ -20,6 +20,21 @@ struct arguments {
   std::array<U*, Shape::outputs> out;
 };
 
+/// Distances between the elements of each operand, in elements.
+template <typename Shape>
+struct increments {
+  std::array<std::int64_t, Shape::inputs> in;
+  std::array<std::int64_t, Shape::outputs> out;
+
+  /// Those of whole arrays.
+  static constexpr increments units() {
+    increments inc;
+    inc.in.fill(1);
+    inc.out.fill(1);
+    return inc;
+  }
+};
+
 template <typename Shape>
 using input_indices = std::make_index_sequence<static_cast<std::size_t>(Shape::inputs)>;
 template <typename Shape>

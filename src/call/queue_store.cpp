@@ -79,4 +79,24 @@ void queue_store::record_device_word(std::uint64_t key, std::uint64_t device_wor
   device_words_.insert_or_assign(key, device_word);
 }
 
+classic::error_handler* queue_store::active_handler() {
+  const std::lock_guard lock(mutex_);
+  return active_handler_;
+}
+
+void queue_store::set_active_handler(classic::error_handler* handler) {
+  const std::lock_guard lock(mutex_);
+  active_handler_ = handler;
+}
+
+lumen_arr_error_callback queue_store::saved_callback() {
+  const std::lock_guard lock(mutex_);
+  return saved_callback_;
+}
+
+void queue_store::set_saved_callback(lumen_arr_error_callback callback) {
+  const std::lock_guard lock(mutex_);
+  saved_callback_ = callback;
+}
+
 }  // namespace arbor::lumen::vm::detail

@@ -11,7 +11,13 @@
 #include <sycl/sycl.hpp>
 #include <unordered_map>
 
+#include "lumen_arr.h"
+
 namespace arbor::lumen::vm::detail {
+
+namespace classic {
+class error_handler;
+}
 
 /// 64-bit FNV-1a of the eight bytes of `value`, lowest byte first.
 constexpr std::uint64_t fnv(std::uint64_t value) {
@@ -50,6 +56,13 @@ class queue_store {
   /// Notes what the queue's device was classified as.
   void record_device_word(std::uint64_t key, std::uint64_t device_word);
 
+  /// The handler that array-math kernels report to, null if there is none, and the callback that
+  /// was registered with them before it.
+  classic::error_handler* active_handler();
+  void set_active_handler(classic::error_handler* handler);
+  lumen_arr_error_callback saved_callback();
+  void set_saved_callback(lumen_arr_error_callback callback);
+
  private:
   queue_store() = default;
   void read_verbosity();
@@ -66,6 +79,8 @@ class queue_store {
   map<std::uint32_t> modes_{first_buckets};
   map<std::atomic<std::uint32_t>> statuses_{first_buckets};
   map<std::uint64_t> device_words_{first_buckets};
+  classic::error_handler* active_handler_ = nullptr;
+  lumen_arr_error_callback saved_callback_ = nullptr;
   std::atomic<std::int32_t> verbosity_{0};
 };
 

@@ -9,6 +9,7 @@
 #include <stdexcept>
 #include <string>
 #include <type_traits>
+#include <variant>
 #include <vector>
 
 #include "call/queue_store.hpp"
@@ -17,6 +18,9 @@
 
 namespace arbor::lumen::vm::detail::cpu::norvane {
 namespace {
+
+using classic::input::linear;
+using classic::input::strided;
 
 template <typename Shape, typename T, typename U>
 using stride_plan = device::strided_args<Shape::inputs, Shape::outputs>;
@@ -85,33 +89,53 @@ class staged_arguments {
   std::array<host::usm_wrapper<U>, Shape::outputs> outputs_;
 };
 
-/// Computes a strided call in runs over which every operand has one increment. A run is one pass
-/// over the last input: a short input is read again from its start until the output is full. Under
-/// the cyclic policy the earlier inputs stand still meanwhile. A call ends with the run that the
-/// last input is too long for; it is empty where the passes fill the output exactly.
+/// The arguments of a strided call, without the arrays.
 template <typename Shape, typename T, typename U>
-void run_strided(arguments<Shape, T, U> args, const stride_plan<Shape, T, U>& plan,
-                 const host_entries<Shape, T, U>& entries) {
-  constexpr std::size_t last = Shape::inputs > 0 ? Shape::inputs - 1 : 0;
-  const auto base = args;
-  increments<Shape> inc{};
-  for (std::size_t j = 0; j < Shape::outputs; ++j) inc.out[j] = plan.out_stride[j];
-  for (std::size_t k = 0; k < Shape::inputs; ++k)
-    inc.in[k] = plan.cyclic && k != last ? 0 : plan.in_stride[k];
-
-  const std::int64_t count = std::max<std::int64_t>(plan.count, 0);
-  const std::int64_t whole = std::max<std::int64_t>(count, 1);
-  const std::int64_t pass = Shape::inputs > 0 && count > 0 ? plan.in_size[last] : whole;
-  for (std::int64_t done = 0; done <= count; done += pass) {
-    for (std::size_t k = 0; k < Shape::inputs; ++k) {
-      const std::int64_t element = count > 0 ? (done / plan.divisor[k]) % plan.in_size[k] : 0;
-      args.in[k] = base.in[k] + plan.in_start[k] + element * plan.in_stride[k];
-    }
-    for (std::size_t j = 0; j < Shape::outputs; ++j)
-      args.out[j] = base.out[j] + plan.out_start[j] + done * plan.out_stride[j];
-    entries.strided(std::min(pass, count - done), args, inc);
+strided<Shape, T, U> with_slices(const input::vxx& record, std::int64_t mode,
+                                 const stride_plan<Shape, T, U>& plan) {
+  strided<Shape, T, U> object(record.name, mode, plan.count, nullptr);
+  object.cyclic = plan.cyclic;
+  for (std::size_t k = 0; k < Shape::inputs; ++k) {
+    object.i_starts.push_back(plan.in_start[k]);
+    object.i_strides.push_back(plan.in_stride[k]);
+    object.i_sizes.push_back(plan.in_size[k]);
+    object.i_divisors.push_back(plan.divisor[k]);
   }
+  for (std::size_t j = 0; j < Shape::outputs; ++j) {
+    object.o_starts.push_back(plan.out_start[j]);
+    object.o_strides.push_back(plan.out_stride[j]);
+    object.o_sizes.push_back(plan.count);
+  }
+  return object;
 }
+
+/// The handler of a call, of the class that its errors ask for. It is made inactive, and nothing
+/// here makes it active: a host call reports no status.
+template <typename T, typename U>
+class call_handler {
+ public:
+  call_handler(const input::typed_vxx<T, U>& record, error_kind errors) {
+    switch (errors) {
+      case error_kind::none:
+        handler_.template emplace<0>(record);
+        break;
+      case error_kind::one_result:
+        handler_.template emplace<1>(record);
+        break;
+      case error_kind::two_results:
+        handler_.template emplace<2>(record);
+        break;
+    }
+  }
+  classic::error_handler* get() {
+    return std::visit([](auto& handler) -> classic::error_handler* { return &handler; }, handler_);
+  }
+
+ private:
+  std::variant<classic::error_handler_typed_var0<T, U>, classic::error_handler_typed_var1<T, U>,
+               classic::error_handler_typed_var2<T, U>>
+      handler_;
+};
 
 void wait_for(const std::vector<sycl::event>& depends) {
   if (!depends.empty()) sycl::event::wait_and_throw(depends);
@@ -120,29 +144,41 @@ void wait_for(const std::vector<sycl::event>& depends) {
 }  // namespace
 
 template <typename Shape, typename T, typename U>
-sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& entries) {
+sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& entries,
+                    call_kind kind) {
+  const auto run = [&](const input::typed_vxx<T, U>& typed, auto& object, const auto& operands) {
+    for (const T* in : operands.in) object.in_pointers.push_back(in);
+    for (U* out : operands.out) object.out_pointers.push_back(out);
+    call_handler<T, U> handler(typed, kind.errors);
+    object.handler = handler.get();
+    object.run(entries, operands.constants);
+  };
   const auto plan_of = device::describe<Shape::inputs, Shape::outputs>;
   if (const auto* buffers = dynamic_cast<const input::buffer::linear<Shape, T, U>*>(&record)) {
     const accessed_arguments<Shape, T, U> args(*buffers);
-    entries.linear(record.effective_count(), args.get());
+    linear<Shape, T, U> object(record.name, kind.mode, record.effective_count(), nullptr);
+    run(*buffers, object, args.get());
   } else if (const auto* arrays = dynamic_cast<const input::usm::linear<Shape, T, U>*>(&record)) {
     wait_for(record.depends);
     const std::int64_t n = record.effective_count();
     const auto count = [n](std::size_t) { return n; };
     const staged_arguments<Shape, T, U> args(*arrays, count, count);
-    entries.linear(n, args.get());
+    linear<Shape, T, U> object(record.name, kind.mode, n, nullptr);
+    run(*arrays, object, args.get());
   } else if (const auto* buffer_slices =
                  dynamic_cast<const input::buffer::strided<Shape, T, U>*>(&record)) {
     const auto plan = plan_of(record);
     const accessed_arguments<Shape, T, U> args(*buffer_slices);
-    run_strided(args.get(), plan, entries);
+    auto object = with_slices<Shape, T, U>(record, kind.mode, plan);
+    run(*buffer_slices, object, args.get());
   } else if (const auto* slices = dynamic_cast<const input::usm::strided<Shape, T, U>*>(&record)) {
     const auto plan = plan_of(record);
     wait_for(record.depends);
     const staged_arguments<Shape, T, U> args(
         *slices, [&](std::size_t k) { return plan.in_extent[k]; },
         [&](std::size_t j) { return plan.out_extent[j]; });
-    run_strided(args.get(), plan, entries);
+    auto object = with_slices<Shape, T, U>(record, kind.mode, plan);
+    run(*slices, object, args.get());
   } else {
     throw std::runtime_error(std::string("vm::detail::cpu::norvane::") + Shape::name +
                              " function was called with incorrect argument types");
@@ -150,9 +186,9 @@ sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& e
   return queue_store::instance().default_event();
 }
 
-#define LUMEN_INSTANTIATE(Shape, T, U)                                \
-  template sycl::event execute<shape::Shape, T, U>(const input::vxx&, \
-                                                   const host_entries<shape::Shape, T, U>&);
+#define LUMEN_INSTANTIATE(Shape, T, U)              \
+  template sycl::event execute<shape::Shape, T, U>( \
+      const input::vxx&, const host_entries<shape::Shape, T, U>&, call_kind);
 #define LUMEN_REAL(Shape)                \
   LUMEN_INSTANTIATE(Shape, float, float) \
   LUMEN_INSTANTIATE(Shape, double, double)

@@ -10,8 +10,7 @@
 #include "device/tuning_info.hpp"
 #include "host/executor.hpp"
 
-/// Host entries made of a scalar functor: plain element loops, so that the host gives the same bits
-/// as every device.
+/// Host entries made of a scalar functor: plain element loops. They serve the internal utilities.
 namespace arbor::lumen::vm::detail::cpu::norvane {
 
 template <typename Shape, typename Functor>
@@ -19,14 +18,11 @@ struct loop {
   using T = typename Functor::input_type;
   using U = typename Functor::output_type;
 
-  static void linear(std::int64_t n, const arguments<Shape, T, U>& args) {
-    increments<Shape> inc;
-    inc.in.fill(1);
-    inc.out.fill(1);
-    run(n, args, inc, input_indices<Shape>{}, output_indices<Shape>{});
+  static void linear(std::int64_t n, const arguments<Shape, T, U>& args, std::int64_t) {
+    run(n, args, increments<Shape>::units(), input_indices<Shape>{}, output_indices<Shape>{});
   }
   static void strided(std::int64_t n, const arguments<Shape, T, U>& args,
-                      const increments<Shape>& inc) {
+                      const increments<Shape>& inc, std::int64_t) {
     run(n, args, inc, input_indices<Shape>{}, output_indices<Shape>{});
   }
 
@@ -47,8 +43,8 @@ struct loop {
 template <typename Shape, typename Functor>
 sycl::event loop_launcher(const input::vxx& record, TuningInfo) {
   using entry = loop<Shape, Functor>;
-  return execute<Shape, typename entry::T, typename entry::U>(record,
-                                                              {&entry::linear, &entry::strided});
+  return execute<Shape, typename entry::T, typename entry::U>(
+      record, {&entry::linear, &entry::strided}, {.mode = 0});
 }
 
 }  // namespace arbor::lumen::vm::detail::cpu::norvane

@@ -30,7 +30,8 @@ constexpr int interleave() {
 #define LUMEN_BLOCK_LOOP
 #endif
 
-/// Of one or two inputs and one or two outputs.
+/// Of one or two inputs and one or two outputs. Every function returns the status masks of all
+/// elements ored.
 template <typename Body, typename T, typename U, int Inputs, int Outputs>
 class block_loop {
  public:
@@ -41,26 +42,46 @@ class block_loop {
   static constexpr std::int64_t length = 512 / std::max(sizeof(T), sizeof(U));
 
   /// Computes `n` elements of whole arrays. An output may be the same array as an input.
-  static void run(std::int64_t n, const T* const (&in)[Inputs], U* const (&out)[Outputs]) {
+  static std::uint32_t run(std::int64_t n, const T* const (&in)[Inputs],
+                           U* const (&out)[Outputs]) {
     std::int64_t first = 0;
+    std::uint32_t status = 0;
     if (are_apart(n, in, out)) {
+      status |= whole_blocks<length>(first, n, in, out);
+      status |= whole_blocks<piece>(first, n, in, out);
+    } else {
       for (; n - first >= length; first += length)
-        block(in[0] + first, second(in, first), out[0] + first, second(out, first));
+        status |= copied_block<length>(length, first, in, unit, out, unit);
     }
-    for (; first < n; first += length) copied_block(first, std::min(length, n - first), in, out);
+    for (; first < n; first += piece) {
+      const std::int64_t count = std::min(piece, n - first);
+      status |= copied_block<piece>(count, first, in, unit, out, unit);
+    }
+    return status;
+  }
+
+  /// The same with the distances between the elements of each operand, zero and negative ones
+  /// included.
+  static std::uint32_t run_strided(std::int64_t n, const T* const (&in)[Inputs],
+                                   const std::int64_t* in_increments, U* const (&out)[Outputs],
+                                   const std::int64_t* out_increments) {
+    std::int64_t first = 0;
+    std::uint32_t status = 0;
+    for (; n - first >= length; first += length)
+      status |= copied_block<length>(length, first, in, in_increments, out, out_increments);
+    for (; first < n; first += piece) {
+      const std::int64_t count = std::min(piece, n - first);
+      status |= copied_block<piece>(count, first, in, in_increments, out, out_increments);
+    }
+    return status;
   }
 
  private:
   using flag = typename rare_flag<U>::type;
 
-  /// The second array from its element `first` on; null where there is one array.
-  template <typename E, int N>
-  static E* second([[maybe_unused]] E* const (&arrays)[N], [[maybe_unused]] std::int64_t first) {
-    if constexpr (N == 2)
-      return arrays[1] + first;
-    else
-      return nullptr;
-  }
+  /// The length of the blocks behind the last whole one: a vector or a few.
+  static constexpr std::int64_t piece = length / 8;
+  static constexpr std::int64_t unit[] = {1, 1};
 
   [[gnu::always_inline]] static inline auto main(const T* a, [[maybe_unused]] const T* b,
                                                  std::int64_t i) {
@@ -71,26 +92,28 @@ class block_loop {
   }
 
   /// The rare path, where the body has one.
-  static void rare(const T* a, [[maybe_unused]] const T* b, U* y, [[maybe_unused]] U* z,
-                   std::int64_t i) {
+  static std::uint32_t rare(const T* a, [[maybe_unused]] const T* b, U* y, [[maybe_unused]] U* z,
+                            std::int64_t i) {
     const T x = load(a + i);
     if constexpr (Inputs == 2) {
-      if constexpr (requires { Body::rare(x, x, y); }) Body::rare(x, load(b + i), y + i);
+      if constexpr (requires { Body::rare(x, x, y); }) return Body::rare(x, load(b + i), y + i);
     } else if constexpr (Outputs == 2) {
-      if constexpr (requires { Body::rare(x, y, z); }) Body::rare(x, y + i, z + i);
+      if constexpr (requires { Body::rare(x, y, z); }) return Body::rare(x, y + i, z + i);
     } else {
-      if constexpr (requires { Body::rare(x, y); }) Body::rare(x, y + i);
+      if constexpr (requires { Body::rare(x, y); }) return Body::rare(x, y + i);
     }
+    return 0;
   }
 
   /// `b` and `z` are null where there is one input, or one output.
-  [[gnu::always_inline]] static inline void block(const T* __restrict a, const T* __restrict b,
-                                                  U* __restrict y,
-                                                  [[maybe_unused]] U* __restrict z) {
-    [[maybe_unused]] constexpr int in_flight = interleave<Body>();
+  template <std::int64_t Length>
+  [[gnu::always_inline]] static inline std::uint32_t block(const T* __restrict a,
+                                                           const T* __restrict b, U* __restrict y,
+                                                           [[maybe_unused]] U* __restrict z) {
+    [[maybe_unused]] constexpr int in_flight = Length == length ? interleave<Body>() : 1;
     flag flags = 0;
     LUMEN_BLOCK_LOOP
-    for (std::int64_t i = 0; i < length; ++i) {
+    for (std::int64_t i = 0; i < Length; ++i) {
       const auto result = main(a, b, i);
       if constexpr (Outputs == 1) {
         store(y + i, result.value);
@@ -101,32 +124,72 @@ class block_loop {
       flags |= result.rare;
     }
     if (flags != 0) [[unlikely]]
-      repair(a, b, y, z);
+      return repair(Length, a, b, y, z);
+    return 0;
+  }
+
+  /// As many blocks as there are from `first` on, which is advanced.
+  template <std::int64_t Length>
+  static std::uint32_t whole_blocks(std::int64_t& first, std::int64_t n,
+                                    const T* const (&in)[Inputs], U* const (&out)[Outputs]) {
+    std::uint32_t status = 0;
+    for (; n - first >= Length; first += Length)
+      status |= block<Length>(in[0] + first, second(in, first), out[0] + first, second(out, first));
+    return status;
+  }
+
+  /// The second array from its element `first` on; null where there is one array.
+  template <typename E, int N>
+  static E* second([[maybe_unused]] E* const (&arrays)[N], [[maybe_unused]] std::int64_t first) {
+    if constexpr (N == 2)
+      return arrays[1] + first;
+    else
+      return nullptr;
   }
 
   /// The flags alone, once more, and the rare path where one is set.
-  [[gnu::noinline, gnu::cold]] static void repair(const T* __restrict a, const T* __restrict b,
-                                                  U* __restrict y, U* __restrict z) {
+  [[gnu::noinline, gnu::cold]] static std::uint32_t repair(std::int64_t count,
+                                                           const T* __restrict a,
+                                                           const T* __restrict b, U* __restrict y,
+                                                           U* __restrict z) {
     flag flags[length];
-    for (std::int64_t i = 0; i < length; ++i) flags[i] = main(a, b, i).rare;
-    for (std::int64_t i = 0; i < length; ++i) {
-      if (flags[i] != 0) rare(a, b, y, z, i);
+    std::uint32_t status = 0;
+    for (std::int64_t i = 0; i < count; ++i) flags[i] = main(a, b, i).rare;
+    for (std::int64_t i = 0; i < count; ++i) {
+      if (flags[i] != 0) status |= rare(a, b, y, z, i);
     }
+    return status;
   }
 
-  /// Fewer elements than a block, or an output over an input: through local blocks. What a short
-  /// block lacks is filled with its first element.
-  static void copied_block(std::int64_t first, std::int64_t count, const T* const (&in)[Inputs],
-                           U* const (&out)[Outputs]) {
-    T a[Inputs][length] = {};
-    U y[Outputs][length];
+  /// Elements that are apart, fewer than a block, or written over an input: through local blocks.
+  /// What a short block lacks is filled with its first element.
+  template <std::int64_t Length>
+  static std::uint32_t copied_block(std::int64_t count, std::int64_t first,
+                                    const T* const (&in)[Inputs],
+                                    const std::int64_t* in_increments, U* const (&out)[Outputs],
+                                    const std::int64_t* out_increments) {
+    T a[Inputs][Length];
+    U y[Outputs][Length];
     for (int k = 0; k < Inputs; ++k) {
-      std::copy_n(in[k] + first, count, a[k]);
-      std::fill(a[k] + count, a[k] + length, a[k][0]);
+      copy(count, in[k] + first * in_increments[k], in_increments[k], a[k], 1);
+      std::fill(a[k] + count, a[k] + Length, a[k][0]);
     }
-    block(a[0], Inputs == 2 ? a[Inputs - 1] : nullptr, y[0],
-          Outputs == 2 ? y[Outputs - 1] : nullptr);
-    for (int k = 0; k < Outputs; ++k) std::copy_n(y[k], count, out[k] + first);
+    const std::uint32_t status =
+        block<Length>(a[0], Inputs == 2 ? a[Inputs - 1] : nullptr, y[0],
+                      Outputs == 2 ? y[Outputs - 1] : nullptr);
+    for (int k = 0; k < Outputs; ++k)
+      copy(count, y[k], 1, out[k] + first * out_increments[k], out_increments[k]);
+    return status;
+  }
+
+  template <typename E>
+  static void copy(std::int64_t count, const E* from, std::int64_t from_increment, E* to,
+                   std::int64_t to_increment) {
+    if (from_increment == 1 && to_increment == 1) {
+      std::copy_n(from, count, to);
+      return;
+    }
+    for (std::int64_t i = 0; i < count; ++i) to[i * to_increment] = from[i * from_increment];
   }
 
   static bool are_apart(std::int64_t n, const T* const (&in)[Inputs], U* const (&out)[Outputs]) {

@@ -135,7 +135,7 @@ TEST_F(HostRuns, PointersAndIncrementsOfEachRun) {
   runs_of({10, 3, -2}, {5, 7, 3}, enums::slice_cyclic);
   ASSERT_EQ(entries::calls.size(), 3u);
   for (std::size_t i = 0; i < 3; ++i) {
-    const auto& [linear, n, args, inc] = entries::calls[i];
+    const auto& [linear, n, args, inc, mode] = entries::calls[i];
     EXPECT_EQ(args.in[0], a_.data() + 10) << "from the input's start";
     EXPECT_EQ(inc.in[0], -2);
     EXPECT_EQ(args.out[0], y_.data() + 5 + 9 * i);

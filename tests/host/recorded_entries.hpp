@@ -21,7 +21,8 @@ struct recorded_entries {
     bool linear;
     std::int64_t n;
     vm::detail::arguments<Shape, T, U> args;
-    cpu::increments<Shape> inc;
+    vm::detail::increments<Shape> inc;
+    std::int64_t mode;
   };
   static inline std::vector<call> calls;
   /// What an entry does besides.
@@ -31,18 +32,20 @@ struct recorded_entries {
     calls.clear();
     act = [](const call&) {};
   }
-  static void linear(std::int64_t n, const vm::detail::arguments<Shape, T, U>& args) {
-    calls.push_back({true, n, args, {}});
+  static void linear(std::int64_t n, const vm::detail::arguments<Shape, T, U>& args,
+                     std::int64_t mode) {
+    calls.push_back({true, n, args, {}, mode});
     act(calls.back());
   }
   static void strided(std::int64_t n, const vm::detail::arguments<Shape, T, U>& args,
-                      const cpu::increments<Shape>& inc) {
-    calls.push_back({false, n, args, inc});
+                      const vm::detail::increments<Shape>& inc, std::int64_t mode) {
+    calls.push_back({false, n, args, inc, mode});
     act(calls.back());
   }
 
-  static sycl::event execute(const vm::detail::input::vxx& record) {
-    return cpu::execute<Shape, T, U>(record, {&linear, &strided});
+  /// Through an executor, with a mode of the array-math layer.
+  static sycl::event execute(const vm::detail::input::vxx& record, std::int64_t mode = 2) {
+    return cpu::execute<Shape, T, U>(record, {&linear, &strided}, {.mode = mode});
   }
   /// The counts of the calls so far.
   static std::vector<std::int64_t> counts() {

@@ -2,8 +2,8 @@
 # SPDX-License-Identifier: Apache-2.0
 """Makes everything repetitive from the registry: `python3 tools/generate CATALOGUE OUT`.
 
-Writes the public headers, the exported overloads, the functor types, the family tables and lists
-for the tests below OUT. Ends with 1 and a message that names the entry if the registry makes no
+Writes the public headers, the exported overloads, the functor types, the family tables, the kernels
+of the array-math module with their wrappers, and lists for the tests below OUT. Ends with 1 and a message that names the entry if the registry makes no
 sense.
 """
 
@@ -16,6 +16,7 @@ import catalogue
 import families
 import functors
 import headers
+import kernels
 import overloads
 import row_list
 from output import Output
@@ -31,7 +32,7 @@ def main() -> int:
         print(f"{sys.argv[1]}: {error}", file=sys.stderr)
         return 1
     output = Output(Path(sys.argv[2]))
-    for generator in (headers, overloads, functors, families, row_list):
+    for generator in (headers, overloads, functors, families, kernels, row_list):
         generator.generate(functions, output)
     output.remove_stale()
     return 0

@@ -134,6 +134,7 @@ class Function:
     units: str = ""
     special: list[str] = field(default_factory=list)
     utility: bool = False
+    library: str = ""
     functors: list[Functor] = field(default_factory=list)
     host_rows: list[HostRow] = field(default_factory=list)
 
@@ -166,6 +167,18 @@ class Function:
     @property
     def has_bodies(self) -> bool:
         return any(functor.body for functor in self.functors)
+
+    def compiled_functors(self) -> dict[str, str]:
+        """For each functor the one whose code it runs: functors with one body share the code of the
+        first of them, unless they ask different things of a device."""
+        first: dict[tuple[str, str, bool], str] = {}
+        return {
+            functor.name: first.setdefault(
+                (functor.type, functor.body, functor.needs_fp64), functor.name
+            )
+            for functor in self.functors
+            if functor.body
+        }
 
     def header_of(self, functor: Functor) -> str:
         """The file that holds the functor's body, relative to src/."""

@@ -4,24 +4,34 @@
 
 from __future__ import annotations
 
-from catalogue import Function
+from catalogue import ELEMENT_TYPES, Function, HostRow
+from kernels import Kernel, has_rows, kernels_of
 from output import Output
 
+# Accuracies as the array-math layer numbers them.
+ARRAY_MATH_MODES = {"la": 1, "ha": 2, "ep": 3}
 
-def _compiled(function: Function) -> dict[str, str]:
-    """For each functor the one whose kernels it runs: functors with one body share the kernels of
-    the first of them, unless they ask different things of a device."""
-    first: dict[tuple[str, str, bool], str] = {}
-    return {
-        functor.name: first.setdefault((functor.type, functor.body, functor.needs_fp64), functor.name)
-        for functor in function.functors
-        if functor.body
-    }
+
+def _classic_row(row: HostRow, kernel: Kernel) -> str:
+    function = kernel.function
+    results = "two_results" if function.shape == "v12" else "one_result"
+    arguments = ", ".join(
+        (
+            f"shape::{function.shape}",
+            ELEMENT_TYPES[kernel.input_letter],
+            ELEMENT_TYPES[kernel.output_letter],
+            kernel.entries,
+            str(ARRAY_MATH_MODES[row.tier]),
+            f"cpu::norvane::error_kind::{results if function.handler else 'none'}",
+        )
+    )
+    launcher = f"&cpu::norvane::classic_launcher<{arguments}>"
+    return f'      {{0x{row.key:x}, {launcher}, "{kernel.wrapper}"}},'
 
 
 def _rows(function: Function) -> list[str]:
     rows = []
-    compiled = _compiled(function)
+    compiled = function.compiled_functors()
     for functor in function.functors:
         if functor.body:
             # Bodies know halves as patterns; kernels, as the arrays hold them.
@@ -30,12 +40,16 @@ def _rows(function: Function) -> list[str]:
             launcher = f"&gpu::norvane::launcher<{arguments}>"
             rows.extend(f'      {{0x{key:x}, {launcher}, "{functor.name}"}},'
                         for key in functor.keys)
-    for row in function.host_rows:
-        functor = function.host_functor(row)
-        if functor:
+    if function.utility:
+        for row in function.host_rows:
+            functor = function.host_functor(row)
             loop = f"shape::{function.shape}, scalar::{compiled[functor.name]}"
             executor = f"&cpu::norvane::loop_launcher<{loop}>"
             rows.append(f'      {{0x{row.key:x}, {executor}, "host loop over {functor.name}"}},')
+    else:
+        kernels = {kernel.letter: kernel for kernel in kernels_of(function)}
+        rows.extend(_classic_row(row, kernels[row.type]) for row in function.host_rows
+                    if row.type in kernels)
     return rows
 
 
@@ -53,7 +67,11 @@ def _family(function: Function) -> str:
 def _unit(functions: list[Function]) -> str:
     text = '#include "dispatch/families.hpp"\n\n#include "dispatch/dispatch_call.hpp"\n'
     if any(function.has_bodies for function in functions):
-        text += '#include "device/launch.hpp"\n#include "host/loop.hpp"\n'
+        text += '#include "device/launch.hpp"\n'
+    if any(function.utility and function.has_bodies for function in functions):
+        text += '#include "host/loop.hpp"\n'
+    if any(kernels_of(function) for function in functions):
+        text += '#include "host/classic_row.hpp"\n'
     for function in functions:
         if function.has_bodies:
             text += f'#include "scalar/generated/{function.name}.hpp"\n'
@@ -94,8 +112,8 @@ def generate(functions: list[Function], output: Output) -> None:
     text += "}  // namespace arbor::lumen::vm::detail\n"
     output.cpp("src/dispatch/families/list.cpp", text)
     for function in functions:
-        if function.has_bodies:
+        if has_rows(function):
             output.cpp(f"src/dispatch/families/{function.name}.cpp", _unit([function]))
-    pending = [function for function in functions if not function.has_bodies]
+    pending = [function for function in functions if not has_rows(function)]
     if pending:
         output.cpp("src/dispatch/families/without_rows.cpp", _unit(pending))
