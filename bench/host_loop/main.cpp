@@ -8,10 +8,12 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <set>
 #include <string>
 #include <utility>
 
+#include "arena.hpp"
 #include "arguments.hpp"
 #include "peers.hpp"
 #include "scalar/block_loop.hpp"
@@ -86,13 +88,14 @@ void add_one(const std::string& name, array_function<T> f, const interval* from,
              std::int64_t n) {
   benchmark::RegisterBenchmark((name + "/" + std::to_string(n)).c_str(),
                                [=](benchmark::State& state) {
+                                 const bench::arena<T>& arrays = bench::arena<T>::of(n);
                                  std::vector<T> x = bench::draw<T>(from[0], n, 1);
                                  bench::make_special(x, kind);
-                                 const std::vector<T> second = bench::draw<T>(from[1], n, 2);
-                                 const T* const in[] = {x.data(), second.data()};
-                                 std::vector<T> y(2 * static_cast<std::size_t>(n));
+                                 std::ranges::copy(x, arrays.input(0));
+                                 std::ranges::copy(bench::draw<T>(from[1], n, 2), arrays.input(1));
+                                 const T* const in[] = {arrays.input(0), arrays.input(1)};
                                  for (auto _ : state) {
-                                   f(in, y.data(), n);
+                                   f(in, arrays.results(), n);
                                    benchmark::ClobberMemory();
                                  }
                                  state.SetItemsProcessed(state.iterations() * n);
