@@ -29,56 +29,6 @@ using enum bench::spacing;
 
 constexpr std::int64_t sizes[] = {4096, std::int64_t{1} << 20};
 
-constexpr bench::arguments all_arguments[] = {
-    {"acos", {{linear, -1, 1}}, {{linear, -1, 1}}},
-    {"acospi", {{linear, -1, 1}}, {{linear, -1, 1}}},
-    {"asin", {{linear, -1, 1}}, {{linear, -1, 1}}},
-    {"asinpi", {{linear, -1, 1}}, {{linear, -1, 1}}},
-    {"atan", {{linear, -10, 10}}, {{linear, -10, 10}}},
-    {"atan2", {{linear, -10, 10}, {linear, -10, 10}}, {{linear, -10, 10}, {linear, -10, 10}}},
-    {"atan2pi", {{linear, -10, 10}, {linear, -10, 10}}, {{linear, -10, 10}, {linear, -10, 10}}},
-    {"atanpi", {{linear, -10, 10}}, {{linear, -10, 10}}},
-    {"cbrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"cos", {{linear, -100, 100}}, {{linear, -100, 100}}},
-    {"div", {{linear, 1, 1000}, {linear, 1, 1000}}, {{linear, 1, 1000}, {linear, 1, 1000}}},
-    {"exp", {{linear, -80, 80}}, {{linear, -600, 600}}},
-    {"exp10", {{linear, -35, 35}}, {{linear, -300, 300}}},
-    {"exp2", {{linear, -120, 120}}, {{linear, -1000, 1000}}},
-    {"expm1", {{linear, -80, 80}}, {{linear, -600, 600}}},
-    {"hypot",
-     {{linear, -100, 100}, {linear, -100, 100}},
-     {{linear, -100, 100}, {linear, -100, 100}}},
-    {"inv", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"invcbrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"invsqrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"ln", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"log10", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"log1p", {{logarithmic, 1e-6, 1e6}}, {{logarithmic, 1e-12, 1e12}}},
-    {"log2", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"pow",
-     {{logarithmic, .01, 100}, {linear, -15, 15}},
-     {{logarithmic, .01, 100}, {linear, -100, 100}}},
-    {"pow2o3", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"pow3o2", {{logarithmic, 1e-20, 1e20}}, {{logarithmic, 1e-200, 1e200}}},
-    {"powr",
-     {{logarithmic, .01, 100}, {linear, -15, 15}},
-     {{logarithmic, .01, 100}, {linear, -100, 100}}},
-    {"powx",
-     {{logarithmic, .01, 100}, {linear, -15, 15}},
-     {{logarithmic, .01, 100}, {linear, -100, 100}}},
-    {"sin", {{linear, -100, 100}}, {{linear, -100, 100}}},
-    {"sincos", {{linear, -100, 100}}, {{linear, -100, 100}}},
-    {"sqrt", {{logarithmic, 1e-30, 1e30}}, {{logarithmic, 1e-300, 1e300}}},
-    {"tan", {{linear, -100, 100}}, {{linear, -100, 100}}},
-};
-
-const bench::arguments* arguments_of(std::string_view function) {
-  for (const bench::arguments& a : all_arguments) {
-    if (a.function == function) return &a;
-  }
-  return nullptr;
-}
-
 /// A second result goes behind the first one, to y + n.
 template <typename T>
 using array_function = void (*)(const T* const* in, T* y, std::int64_t n);
@@ -105,7 +55,7 @@ void add_one(const std::string& name, array_function<T> f, const interval* from,
 template <typename T>
 void add(std::string_view function, char type, std::string_view implementation,
          array_function<T> f) {
-  const bench::arguments* const from = arguments_of(function);
+  const bench::arguments* const from = bench::arguments_of(function);
   if (from == nullptr) return;
   const interval* const intervals = sizeof(T) == 4 ? from->of_float : from->of_double;
   const std::string name =

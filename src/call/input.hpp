@@ -42,11 +42,19 @@ inline constexpr std::uint64_t precision_of_pair =
 template <typename T>
 class error_handler_x final : public error_handler<T> {
  public:
-  error_handler_x() = default;
+  /// Stands for no handler until one is assigned: its buffer is not its own, which spares a call
+  /// that is still being built the making of one.
+  error_handler_x() : error_handler<T>(none()) {}
   explicit error_handler_x(const error_handler<T>& handler) : error_handler<T>(handler) {}
   error_handler_x& operator=(const error_handler<T>& handler) {
     error_handler<T>::operator=(handler);
     return *this;
+  }
+
+ private:
+  static const error_handler<T>& none() {
+    static const error_handler<T> handler;
+    return handler;
   }
 };
 

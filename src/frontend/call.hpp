@@ -38,6 +38,7 @@ class call<input::record<Form, Shape, T, U>> {
   }
   call& with(const error_handler<U>& handler) {
     record_.handler = handler;
+    has_handler_ = true;
     return *this;
   }
 
@@ -98,9 +99,15 @@ class call<input::record<Form, Shape, T, U>> {
     return out(y);
   }
 
-  sycl::event run(sycl::event (*dispatcher)(const input::vxx&)) { return dispatcher(record_); }
+  sycl::event run(sycl::event (*dispatcher)(const input::vxx&)) {
+    // Kernels on buffers write to the handler's buffer, also where it reports nothing, so that
+    // every call needs one of its own.
+    if (!has_handler_) record_.handler = error_handler<U>();
+    return dispatcher(record_);
+  }
 
  private:
+  bool has_handler_ = false;
   input::record<Form, Shape, T, U> record_;
 };
 

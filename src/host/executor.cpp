@@ -9,6 +9,7 @@
 #include <stdexcept>
 #include <string>
 #include <type_traits>
+#include <typeinfo>
 #include <variant>
 #include <vector>
 
@@ -137,6 +138,13 @@ class call_handler {
       handler_;
 };
 
+/// The record as `Record` if it is one. Records have final classes, so the types are compared,
+/// which takes a fraction of a dynamic cast.
+template <typename Record>
+const Record* exactly(const input::vxx& record) {
+  return typeid(record) == typeid(Record) ? static_cast<const Record*>(&record) : nullptr;
+}
+
 void wait_for(const std::vector<sycl::event>& depends) {
   if (!depends.empty()) sycl::event::wait_and_throw(depends);
 }
@@ -154,24 +162,23 @@ sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& e
     object.run(entries, operands.constants);
   };
   const auto plan_of = device::describe<Shape::inputs, Shape::outputs>;
-  if (const auto* buffers = dynamic_cast<const input::buffer::linear<Shape, T, U>*>(&record)) {
+  if (const auto* buffers = exactly<input::buffer::linear<Shape, T, U>>(record)) {
     const accessed_arguments<Shape, T, U> args(*buffers);
     linear<Shape, T, U> object(record.name, kind.mode, record.effective_count(), nullptr);
     run(*buffers, object, args.get());
-  } else if (const auto* arrays = dynamic_cast<const input::usm::linear<Shape, T, U>*>(&record)) {
+  } else if (const auto* arrays = exactly<input::usm::linear<Shape, T, U>>(record)) {
     wait_for(record.depends);
     const std::int64_t n = record.effective_count();
     const auto count = [n](std::size_t) { return n; };
     const staged_arguments<Shape, T, U> args(*arrays, count, count);
     linear<Shape, T, U> object(record.name, kind.mode, n, nullptr);
     run(*arrays, object, args.get());
-  } else if (const auto* buffer_slices =
-                 dynamic_cast<const input::buffer::strided<Shape, T, U>*>(&record)) {
+  } else if (const auto* buffer_slices = exactly<input::buffer::strided<Shape, T, U>>(record)) {
     const auto plan = plan_of(record);
     const accessed_arguments<Shape, T, U> args(*buffer_slices);
     auto object = with_slices<Shape, T, U>(record, kind.mode, plan);
     run(*buffer_slices, object, args.get());
-  } else if (const auto* slices = dynamic_cast<const input::usm::strided<Shape, T, U>*>(&record)) {
+  } else if (const auto* slices = exactly<input::usm::strided<Shape, T, U>>(record)) {
     const auto plan = plan_of(record);
     wait_for(record.depends);
     const staged_arguments<Shape, T, U> args(

@@ -42,8 +42,7 @@ class block_loop {
   static constexpr std::int64_t length = 512 / std::max(sizeof(T), sizeof(U));
 
   /// Computes `n` elements of whole arrays. An output may be the same array as an input.
-  static std::uint32_t run(std::int64_t n, const T* const (&in)[Inputs],
-                           U* const (&out)[Outputs]) {
+  static std::uint32_t run(std::int64_t n, const T* const (&in)[Inputs], U* const (&out)[Outputs]) {
     std::int64_t first = 0;
     std::uint32_t status = 0;
     if (are_apart(n, in, out)) {
@@ -165,18 +164,16 @@ class block_loop {
   /// What a short block lacks is filled with its first element.
   template <std::int64_t Length>
   static std::uint32_t copied_block(std::int64_t count, std::int64_t first,
-                                    const T* const (&in)[Inputs],
-                                    const std::int64_t* in_increments, U* const (&out)[Outputs],
-                                    const std::int64_t* out_increments) {
+                                    const T* const (&in)[Inputs], const std::int64_t* in_increments,
+                                    U* const (&out)[Outputs], const std::int64_t* out_increments) {
     T a[Inputs][Length];
     U y[Outputs][Length];
     for (int k = 0; k < Inputs; ++k) {
+      std::fill_n(a[k], Length, in[k][first * in_increments[k]]);
       copy(count, in[k] + first * in_increments[k], in_increments[k], a[k], 1);
-      std::fill(a[k] + count, a[k] + Length, a[k][0]);
     }
-    const std::uint32_t status =
-        block<Length>(a[0], Inputs == 2 ? a[Inputs - 1] : nullptr, y[0],
-                      Outputs == 2 ? y[Outputs - 1] : nullptr);
+    const std::uint32_t status = block<Length>(a[0], Inputs == 2 ? a[Inputs - 1] : nullptr, y[0],
+                                               Outputs == 2 ? y[Outputs - 1] : nullptr);
     for (int k = 0; k < Outputs; ++k)
       copy(count, y[k], 1, out[k] + first * out_increments[k], out_increments[k]);
     return status;

@@ -35,12 +35,17 @@ buffer_storage::buffer_storage(const buffer_description& description,
 }
 
 buffer_storage::~buffer_storage() {
-  if (!in_place_ && data_ != nullptr) memory_->release(data_, elements_);
+  if (!in_place_ && !is_small_ && data_ != nullptr) memory_->release(data_, elements_);
 }
 
 void buffer_storage::allocate() {
   data_ = nullptr;
-  if (elements_ != 0) {
+  if (elements_ != 0 && elements_ * element_size_ <= small && memory_->is_default()) {
+    std::size_t space = sizeof small_;
+    data_ = small_;
+    data_ = std::align(small, elements_ * element_size_, data_, space);
+    is_small_ = true;
+  } else if (elements_ != 0) {
     try {
       data_ = memory_->allocate(elements_);
     } catch (const std::bad_alloc&) {

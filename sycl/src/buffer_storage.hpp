@@ -46,6 +46,11 @@ class buffer_storage : public std::enable_shared_from_this<buffer_storage> {
  private:
   void allocate();
 
+  /// Room for a buffer of a few elements, which then costs no allocation, aligned like any other.
+  static constexpr std::size_t small = 64;
+  alignas(std::max_align_t) std::byte small_[2 * small];
+  bool is_small_ = false;
+
   std::size_t elements_;
   std::size_t element_size_;
   std::unique_ptr<buffer_memory> memory_;

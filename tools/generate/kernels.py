@@ -186,13 +186,13 @@ def _tables(kernels: list[Kernel]) -> str:
 def _list(kernels: list[Kernel]) -> str:
     """Every kernel with its coordinates, for the tests."""
     rows = [
-        f"  M({k.function.name}, {k.function.shape}, {ELEMENT_TYPES[k.input_letter]},"
-        f" {ELEMENT_TYPES[k.output_letter]}, {k.name}, {', '.join(k.functors)})"
+        f"  M({k.name}, {k.function.shape}, {k.input_letter}, {k.output_letter},"
+        f" {', '.join(functor.removeprefix('scalar::') for functor in k.functors)})"
         for k in kernels
         if not k.from_library
     ]
-    text = "#pragma once\n\n/// M(function, shape, input element, output element, name, functors of"
-    text += " ha, la and ep) for every\n/// kernel made of functors.\n"
+    text = "#pragma once\n\n/// M(name, shape, input letter, output letter, functors of ha, la and ep)"
+    text += " for every kernel that is\n/// made of functors.\n"
     return text + "#define LUMEN_KERNELS(M) \\\n" + " \\\n".join(rows) + "\n"
 
 
@@ -236,6 +236,6 @@ def generate(functions: list[Function], output: Output) -> None:
     if library:
         output.cpp("arrmath/library_kernels.cpp", _unit(library, "library/functions.hpp", using))
     output.cpp("arrmath/tables.cpp", _tables(kernels))
-    output.cpp("arrmath/kernel_list.hpp", _list(kernels))
+    output.cpp("tests/kernel_list.hpp", _list(kernels))
     output.cpp("src/host/kernels.hpp", _declarations(kernels))
     output.cpp("src/host/kernels.cpp", _wrappers(kernels))

@@ -58,6 +58,9 @@ class allocator_memory final : public buffer_memory {
   void release(void* memory, std::size_t elements) noexcept override {
     std::allocator_traits<AllocatorT>::deallocate(allocator_, static_cast<T*>(memory), elements);
   }
+  bool is_default() const noexcept override {
+    return alignof(T) <= 64 && std::is_same_v<AllocatorT, aligned_allocator<T>>;
+  }
 
  private:
   AllocatorT allocator_;

@@ -17,6 +17,8 @@ class ARBOR_LUMEN_SYCL_API buffer_memory {
   virtual ~buffer_memory();
   virtual void* allocate(std::size_t elements) = 0;
   virtual void release(void* memory, std::size_t elements) noexcept = 0;
+  /// Whether it is the default allocator's, so that nobody sees when none is asked for.
+  virtual bool is_default() const noexcept = 0;
 };
 
 /// Where a buffer's contents go in the end.
