@@ -8,7 +8,7 @@
 
 #include "scalar/complex/double_double.hpp"
 #include "scalar/complex/product_recovery.hpp"
-#include "scalar/complex/scaled_double.hpp"
+#include "scalar/complex/scaled_products.hpp"
 #include "scalar/complex/status.hpp"
 #include "scalar/protocol.hpp"
 
@@ -66,30 +66,6 @@ struct mul_c_ep : scalar_v21<mul_c_ep, std::complex<float>> {
   }
 };
 
-/// pq + rs with one rounding for finite numbers of any size.
-LUMEN_DEVICE inline double scaled_sum_of_products(double p, double q, double r, double s) {
-  const scaled_double sp = scaled_double::of(p), sq = scaled_double::of(q);
-  const scaled_double sr = scaled_double::of(r), ss = scaled_double::of(s);
-  const int pq_exponent = sp.exponent + sq.exponent;
-  const int rs_exponent = sr.exponent + ss.exponent;
-  double_double larger = two_product(sp.significand, sq.significand);
-  double_double smaller = two_product(sr.significand, ss.significand);
-  int exponent = pq_exponent;
-  int distance = pq_exponent - rs_exponent;
-  if (distance < 0) {
-    const double_double swapped = larger;
-    larger = smaller;
-    smaller = swapped;
-    exponent = rs_exponent;
-    distance = -distance;
-  }
-  // The smaller product counts as a sticky bit beyond the reach of a double-double.
-  constexpr int furthest = 400;
-  const double scale = power_of_two(-(distance < furthest ? distance : furthest));
-  const double_double sum = sum_of_products(larger, {smaller.high * scale, smaller.low * scale});
-  return scaled_back(fast_two_sum(sum.high, sum.low), exponent);
-}
-
 /// mul(x, y) for complex double, la and ha: each part is within 0.5000001 ulp, whatever cancels.
 /// Code 3 if a part of the product overflows; infinite operands by C99 Annex G. A part that is
 /// exactly zero is +0.
@@ -115,7 +91,7 @@ struct mul_z : scalar_v21<mul_z, std::complex<double>> {
       *r = plain_product(x, y);
       return mask(code::none);
     }
-    *r = {scaled_sum_of_products(a, c, b, -d), scaled_sum_of_products(b, c, a, d)};
+    *r = {rounded_sum_of_products(a, c, b, -d), rounded_sum_of_products(b, c, a, d)};
     return overflow_mask(*r);
   }
 

@@ -37,6 +37,33 @@ def interpolate(
     return result
 
 
+def least_squares(
+    points: Sequence[Decimal],
+    function: Callable[[Decimal], Decimal],
+    weight: Callable[[Decimal], Decimal],
+    degree: int,
+) -> list[Decimal]:
+    """Coefficients, lowest first, of the smallest sum of squares of the weighted errors; by the
+    normal equations, so that the arithmetic must have more than twice the digits of the error."""
+    size = degree + 1
+    rows = [[Decimal(0)] * (size + 1) for _ in range(size)]
+    for x in points:
+        w = weight(x)
+        terms = [w * x**i for i in range(size)] + [w * function(x)]
+        for i in range(size):
+            for j in range(size + 1):
+                rows[i][j] += terms[i] * terms[j]
+    for i in range(size):
+        for k in range(i + 1, size):
+            factor = rows[k][i] / rows[i][i]
+            rows[k] = [a - factor * b for a, b in zip(rows[k], rows[i])]
+    result = [Decimal(0)] * size
+    for i in range(size - 1, -1, -1):
+        known = sum(rows[i][j] * result[j] for j in range(i + 1, size))
+        result[i] = (rows[i][size] - known) / rows[i][i]
+    return result
+
+
 def evaluate(coefficients: Sequence[float], x: Decimal) -> Decimal:
     """Coefficients lowest first."""
     value = Decimal(0)

@@ -35,6 +35,17 @@ struct quarter_turn_series {
   }
 };
 
+/// sin r and cos r on |r| <= pi/4 from z = r^2, to 28 bits.
+LUMEN_MAIN double short_sine_series(double r, double z) {
+  return fma(horner(z, 0xbf299076bb901430u, 0x3f8110630f1a5f72u, 0xbfc55553fe6f4534u,
+                    0xbe2a670b2f4764e4u),
+             r, r);
+}
+LUMEN_MAIN double short_cosine_series(double z) {
+  return horner(z, 0x3ef9906ffd58bf6du, 0xbf56c078624df59au, 0x3fa55553a875b0c5u,
+                0xbfdffffffbdee95eu, 0x3feffffffff97c47u);
+}
+
 /// sin(r + low) from q = z times the sine's series.
 LUMEN_MAIN double sine_kernel(double r, double low, double q) { return fma(r, q, low) + r; }
 

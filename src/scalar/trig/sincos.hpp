@@ -140,11 +140,7 @@ struct sincos_d : scalar_v12<sincos_d<t>, double> {
       const double cosine = fma(quarter_turn_series::of_cosine(z), z, -0.5);
       return {fma(r, quarter_turn_series::of_sine(z) * z, r), fma(cosine, z, 1.0)};
     } else {
-      const double sine = horner(z, 0xbf299076bb901430u, 0x3f8110630f1a5f72u, 0xbfc55553fe6f4534u,
-                                 0xbe2a670b2f4764e4u);
-      const double cosine = horner(z, 0x3ef9906ffd58bf6du, 0xbf56c078624df59au, 0x3fa55553a875b0c5u,
-                                   0xbfdffffffbdee95eu, 0x3feffffffff97c47u);
-      return {fma(sine, r, r), cosine};
+      return {short_sine_series(r, z), short_cosine_series(z)};
     }
   }
 };
