@@ -109,7 +109,7 @@ class complex_reference {
     if (overflows<R>(exact)) {
       // Up to a unit below the bound the largest number is as good.
       return std::isinf(result) && std::signbit(result) == (mpfr_signbit(exact) != 0) ? 0
-             : std::fabs(result) == limits::max()                                    ? 1
+             : std::fabs(result) == limits::max()                                     ? 1
                                                                                       : infinity;
     }
     if (std::isnan(result)) return infinity;
@@ -118,7 +118,8 @@ class complex_reference {
       return mpfr_cmp_d(a_, static_cast<double>(limits::max())) >= 0 ? 1 : infinity;
     }
     if (result == 0 && mpfr_zero_p(exact)) return 0;
-    const long exponent = std::max<long>(mpfr_get_exp(exact), limits::min_exponent) - limits::digits;
+    const long exponent =
+        std::max<long>(mpfr_get_exp(exact), limits::min_exponent) - limits::digits;
     mpfr_d_sub(a_, static_cast<double>(result), exact, MPFR_RNDN);
     mpfr_mul_2si(a_, a_, -exponent, MPFR_RNDN);
     return std::fabs(mpfr_get_d(a_, MPFR_RNDA));

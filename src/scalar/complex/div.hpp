@@ -65,8 +65,7 @@ struct div_c : scalar_v21<div_c, std::complex<float>> {
 };
 
 /// div(x, y) for complex float, ep: the same with the reciprocal of the divisor's square in float;
-/// each part within 1.6 ulp where the square is in [2^-126, 2^126], 0.9 ulp of it a factor that
-/// both parts share. Status 0.
+/// each part within 2.5 ulp where the square is in [2^-126, 2^126]. Status 0.
 ///
 /// The square is not scaled: for |y| from 2^64 on the quotient is 0. Where it underflows, the
 /// quotient is infinite or a NaN at first, and that is repaired.

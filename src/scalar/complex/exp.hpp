@@ -86,7 +86,7 @@ struct exp_c : scalar_v11<exp_c<t>, std::complex<float>> {
 template <tier t>
 struct exp_z : scalar_v11<exp_z<t>, std::complex<double>> {
   using complex = std::complex<double>;
-  static constexpr int interleave = t == tier::ha ? 1 : 2;
+  static constexpr int interleave = 2;
 
   LUMEN_MAIN main_result<complex> main(complex z) {
     const complex r = product(z);

@@ -65,7 +65,6 @@ struct ln_c : scalar_v11<ln_c, std::complex<float>> {
 template <tier t>
 struct ln_z : scalar_v11<ln_z<t>, std::complex<double>> {
   using complex = std::complex<double>;
-  static constexpr int interleave = 2;
 
   LUMEN_MAIN main_result<complex> main(complex z) {
     const auto p = quadrant<double>::of(z.imag(), z.real());
@@ -127,16 +126,10 @@ struct ln_z : scalar_v11<ln_z<t>, std::complex<double>> {
 
   /// (ln(1 + r) - r)/(2r) on [-1/2, 1], in three blocks of coefficients for a shorter chain.
   LUMEN_MAIN double half_log1p_rest(double r) {
-    const auto& c = half_log1p;
-    const auto block = [&c](double x, int first, int last) {
-      double p = value(c[first]);
-      for (int i = first + 1; i <= last; ++i) p = fma(p, x, value(c[i]));
-      return p;
-    };
     const double r2 = r * r, r4 = r2 * r2, r8 = r4 * r4;
     const double r10 = r8 * r2;
-    const double high = fma(block(r, 0, 9), r10, block(r, 10, 19));
-    return fma(high, r10 * r, block(r, 20, 30));
+    const double high = fma(horner_of(r, half_log1p_high), r10, horner_of(r, half_log1p_middle));
+    return fma(high, r10 * r, horner_of(r, half_log1p_low));
   }
 };
 
@@ -147,7 +140,6 @@ struct ln_z : scalar_v11<ln_z<t>, std::complex<double>> {
 template <>
 struct ln_z<tier::ha> : scalar_v11<ln_z<tier::ha>, std::complex<double>> {
   using complex = std::complex<double>;
-  static constexpr int interleave = 1;
 
   LUMEN_MAIN main_result<complex> main(complex z) {
     const auto p = quadrant<double>::of(z.imag(), z.real());

@@ -9,8 +9,9 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// Highest first: (ln(1 + t)/2 - t/2)/t on [-1/2, 1]; the logarithm within 2.0e-16 of itself.
-static constexpr std::uint64_t half_log1p[31] = {
+/// Highest first: (ln(1 + t)/2 - t/2)/t on [-1/2, 1], the powers from 21 to 30; the
+/// logarithm within 2.0e-16 of itself.
+static constexpr std::uint64_t half_log1p_high[10] = {
     0x3f3e741ca327f41f,  // 0.0004646844783165477
     0xbf708871e6589126,  // -0.004036374016809929
     0x3f8f57604091759f,  // 0.015303375215973967
@@ -21,6 +22,10 @@ static constexpr std::uint64_t half_log1p[31] = {
     0xbf7b4583873965fc,  // -0.0066580903836324055
     0x3f926077dcffe779,  // 0.017946122039553345
     0xbf9c493a882b2dc5,  // -0.027623095093799472
+};
+
+/// Those from 11 to 20.
+static constexpr std::uint64_t half_log1p_middle[10] = {
     0x3f9c1f24f235d701,  // 0.02746255615553306
     0xbf99347a651e4cc9,  // -0.02461425058534131
     0x3f99b68bbad6e772,  // 0.025110419539238156
@@ -31,6 +36,10 @@ static constexpr std::uint64_t half_log1p[31] = {
     0xbfa2476622a251fa,  // -0.03570098088053793
     0x3fa3b15c8f7533d4,  // 0.038462536346379445
     0xbfa55581e9d0083d,  // -0.04166799525411633
+};
+
+/// Those from 0 to 10.
+static constexpr std::uint64_t half_log1p_low[11] = {
     0x3fa745d1fda804b0,  // 0.04545456143751758
     0xbfa99996d2a03883,  // -0.04999991723171695
     0x3fac71c6f772e0a8,  // 0.05555555124868877

@@ -75,7 +75,6 @@ struct sqrt_c : scalar_v11<sqrt_c, std::complex<float>> {
 /// the root in two words as well, of y itself: its scaled value may underflow.
 struct sqrt_z : scalar_v11<sqrt_z, std::complex<double>> {
   using complex = std::complex<double>;
-  static constexpr int interleave = 2;
 
   LUMEN_MAIN main_result<complex> main(complex z) {
     const double a = fabs(z.real()), b = fabs(z.imag());

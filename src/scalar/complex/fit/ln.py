@@ -66,6 +66,21 @@ def error_of_t(coefficients: Sequence[float]) -> Decimal:
     return max(abs((evaluate(coefficients, t) - of_t(t)) * relative_weight(t)) for t in samples)
 
 
+def blocks_of(coefficients: Sequence[float]) -> list[Array]:
+    """Three arrays by powers: 30 to 21, 20 to 11, 10 to 0."""
+    highest_first = coefficients[::-1]
+    return [
+        Array(
+            "half_log1p_high",
+            "Highest first: (ln(1 + t)/2 - t/2)/t on [-1/2, 1], the powers from 21 to 30; the\n"
+            f"logarithm within {error_of_t(coefficients):.1e} of itself.",
+            highest_first[:10],
+        ),
+        Array("half_log1p_middle", "Those from 11 to 20.", highest_first[10:20]),
+        Array("half_log1p_low", "Those from 0 to 10.", highest_first[20:]),
+    ]
+
+
 def of_w(w: Decimal) -> Decimal:
     f = w.sqrt()
     return (((1 + f) / (1 - f)).ln() / 2 - f) / (f * w)
@@ -86,12 +101,7 @@ def main() -> None:
         FOLDER / "ln_constants.hpp",
         __file__,
         [
-            Array(
-                "half_log1p",
-                "Highest first: (ln(1 + t)/2 - t/2)/t on [-1/2, 1]; the logarithm within"
-                f" {error_of_t(logarithm):.1e} of itself.",
-                logarithm[::-1],
-            ),
+            *blocks_of(logarithm),
             Array(
                 "artanh_rest",
                 "Highest first: (artanh f - f)/f^3 of f^2 for |f| <= (√2 - 1)/(√2 + 1);\nartanh f"
