@@ -104,9 +104,9 @@ LUMEN_MAIN exponential_factors short_factors(double x) {
   const float shifted = fma(static_cast<float>(x), value(0x3fb8aa3bu), shifter);
   const double n = static_cast<double>(shifted - shifter);
   const double r = fma(value(0xbfe62e42fefa39efu), n, x);
-  const double rest = horner(r, 0x3f56dd9818211af0u, 0x3f8126fababd1cf2u, 0x3fa55541c4c8cb89u,
-                             0x3fc55540432ea07bu, 0x3fe00000090aa64au, 0x3ff000000a208385u,
-                             0xbdd63f26cce7780fu);
+  const double rest =
+      horner(r, 0x3f56dd9818211af0u, 0x3f8126fababd1cf2u, 0x3fa55541c4c8cb89u, 0x3fc55540432ea07bu,
+             0x3fe00000090aa64au, 0x3ff000000a208385u, 0xbdd63f26cce7780fu);
   return {std::uint64_t{bits(shifted)} << 52, rest};
 }
 

@@ -37,9 +37,9 @@ struct quarter_turn_series {
 
 /// sin r and cos r on |r| <= pi/4 from z = r^2, to 28 bits.
 LUMEN_MAIN double short_sine_series(double r, double z) {
-  return fma(horner(z, 0xbf299076bb901430u, 0x3f8110630f1a5f72u, 0xbfc55553fe6f4534u,
-                    0xbe2a670b2f4764e4u),
-             r, r);
+  return fma(
+      horner(z, 0xbf299076bb901430u, 0x3f8110630f1a5f72u, 0xbfc55553fe6f4534u, 0xbe2a670b2f4764e4u),
+      r, r);
 }
 LUMEN_MAIN double short_cosine_series(double z) {
   return horner(z, 0x3ef9906ffd58bf6du, 0xbf56c078624df59au, 0x3fa55553a875b0c5u,
