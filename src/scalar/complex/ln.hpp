@@ -7,7 +7,6 @@
 #include <cstdint>
 
 #include "scalar/atrig/arctangent_polynomial.hpp"
-#include "scalar/atrig/bitwise_choice.hpp"
 #include "scalar/complex/double_double.hpp"
 #include "scalar/complex/ln_constants.hpp"
 #include "scalar/complex/logarithm_parts.hpp"
