@@ -1,0 +1,25 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+/// Cosine of complex elements.
+#pragma once
+
+#include <cmath>
+#include <complex>
+#include <cstdint>
+
+#include "library/wide.hpp"
+
+namespace arbor::lumen::vm::detail::library {
+
+template <typename T>
+struct cos {
+  using input_type = T;
+  using output_type = T;
+  static std::uint32_t call(const T* a, T* y) {
+    *y = narrow<T>(std::cos(widen(*a)));
+    return success;
+  }
+};
+
+}  // namespace arbor::lumen::vm::detail::library

@@ -1,0 +1,25 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+/// Sine of pi times the argument. An infinity is a domain error.
+#pragma once
+
+#include <cmath>
+#include <cstdint>
+
+#include "library/turn.hpp"
+
+namespace arbor::lumen::vm::detail::library {
+
+template <typename T>
+struct sinpi {
+  using input_type = T;
+  using output_type = T;
+  static std::uint32_t call(const T* a, T* y) {
+    const T x = *a;
+    *y = sine_in<half_turns>(x);
+    return std::isinf(x) ? domain : success;
+  }
+};
+
+}  // namespace arbor::lumen::vm::detail::library

@@ -1,0 +1,25 @@
+// SPDX-FileCopyrightText: The Arbor Lumen authors
+// SPDX-License-Identifier: Apache-2.0
+
+/// Bessel functions Y_b(a) of integer order; the order is cut to an integer. Every argument has the
+/// status success.
+#pragma once
+
+#include <cmath>
+#include <cstdint>
+
+#include "library/bessel.hpp"
+
+namespace arbor::lumen::vm::detail::library {
+
+template <typename T>
+struct yn {
+  using input_type = T;
+  using output_type = T;
+  static std::uint32_t call(const T* a, T b, T* y) {
+    *y = std::isnan(b) ? b + b : second_kind<T>(order_of(b), *a);
+    return success;
+  }
+};
+
+}  // namespace arbor::lumen::vm::detail::library
