@@ -28,7 +28,7 @@ template <typename T>
 bool near_zero(int n, long double x, long double y) {
   constexpr long double two_by_pi = 0.636619772367581343075535053490057448L;
   constexpr int spare = std::numeric_limits<long double>::digits - std::numeric_limits<T>::digits;
-  constexpr int kept = spare > 4 ? spare - 3 : 1;
+  constexpr int kept = spare > 6 ? spare - 5 : 1;
   return x > n && x <= series::largest_argument &&
          std::fabs(std::ldexp(y, kept)) < std::sqrt(two_by_pi / x);
 }
