@@ -74,12 +74,12 @@ void expect_bessel(const std::string& function, exact_function exact, double fro
   expect_within(1.0, errors<F>(exact, arguments<T>({{from, 40}, {1, 40}}, count)), name);
   const double largest = std::sqrt(std::numeric_limits<T>::max());
   const std::vector<T> near = about_zeros<T>(exact, std::abs(order) + 0.5, 40, 200);
-  EXPECT_GT(near.size(), 50u);
+  EXPECT_GT(near.size(), 20u);
   expect_within(1.0, errors<F>(exact, near), name + ", near zeros up to 40");
   expect_within(1.0,
                 errors_by_amplitude<F>(exact, arguments<T>({{40, 1000}, {40, largest}}, count / 4)),
                 name + ", beyond 40 by amplitude");
-  expect_within(1.0, errors_by_amplitude<F>(exact, about_zeros<T>(exact, 40, 120, 400)),
+  expect_within(1.0, errors_by_amplitude<F>(exact, about_zeros<T>(exact, 40, 60, 100)),
                 name + ", near zeros beyond 40 by amplitude");
 }
 
@@ -87,11 +87,11 @@ template <typename T>
 void expect_orders_0_and_1() {
   const double smallest = std::numeric_limits<T>::denorm_min();
   order = 0;
-  expect_bessel<lib::j0<T>>("j0", exact_j, -40, 400);
-  expect_bessel<lib::y0<T>>("y0", exact_y, smallest, 400);
+  expect_bessel<lib::j0<T>>("j0", exact_j, -40, 250);
+  expect_bessel<lib::y0<T>>("y0", exact_y, smallest, 250);
   order = 1;
-  expect_bessel<lib::j1<T>>("j1", exact_j, -40, 400);
-  expect_bessel<lib::y1<T>>("y1", exact_y, smallest, 400);
+  expect_bessel<lib::j1<T>>("j1", exact_j, -40, 250);
+  expect_bessel<lib::y1<T>>("y1", exact_y, smallest, 250);
 }
 
 TEST(LibraryBessel, Orders0And1) {
@@ -102,11 +102,11 @@ TEST(LibraryBessel, Orders0And1) {
 template <typename T>
 void expect_other_orders() {
   const double smallest = std::numeric_limits<T>::denorm_min();
-  for (const int n : {2, 3, 7, 20, -5}) {
+  for (const int n : {2, 20, -5}) {
     order = n;
     const std::string name = std::to_string(n);
-    expect_bessel<of_order<lib::jn, T>>("jn of order " + name, exact_j, -40, 100);
-    expect_bessel<of_order<lib::yn, T>>("yn of order " + name, exact_y, smallest, 100);
+    expect_bessel<of_order<lib::jn, T>>("jn of order " + name, exact_j, -40, 40);
+    expect_bessel<of_order<lib::yn, T>>("yn of order " + name, exact_y, smallest, 40);
   }
 }
 

@@ -114,7 +114,7 @@ std::vector<T> about_zero(exact_function exact, T low, T high) {
     (positive(x) == rising ? to : from) = middle;
   }
   std::vector<T> list;
-  for (std::int64_t distance = 0; distance < (std::int64_t{1} << 40); distance = 4 * distance + 1) {
+  for (std::int64_t distance = 0; distance < (std::int64_t{1} << 40); distance = 8 * distance + 1) {
     list.push_back(static_cast<T>(format.value(format.at_rank(to + distance))));
     list.push_back(static_cast<T>(format.value(format.at_rank(from - distance))));
     if (sizeof(T) == 4 && distance > (1 << 12)) break;
