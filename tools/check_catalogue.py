@@ -35,7 +35,7 @@ REQUIRED = {
     "kernels": list, "host": list, "bodies": dict, "brief": str, "formula": str, "domain": str,
     "special": list, "accuracy": str, "source": str,
 }
-OPTIONAL = {"range": str, "units": str, "utility": bool}
+OPTIONAL = {"library": str, "range": str, "units": str, "utility": bool}
 NOT_REQUIRED_OF_UTILITIES = {"source"}
 
 KERNEL_ENTRY = re.compile(r"([sdhcz]): (.+)")
@@ -314,6 +314,11 @@ def check_types(entry, functors, host, where, problems):
         problems.add(where, f"kernels: types {kernel_types - served} are none of the function's")
     if set(host) != served - {"h"}:
         problems.add(where, f"host: types {sorted(host)}, expected {sorted(served - {'h'})}")
+    for element in entry.get("library", ""):
+        if element not in host:
+            problems.add(where, f"library: no host kernel of type '{element}'")
+        if any(key.split(".")[0] == element for key in entry["bodies"]):
+            problems.add(where, f"library: type '{element}' has a body")
     for key in entry["bodies"]:
         element, *rest = key.split(".")
         if entry.get("utility") and element in host:

@@ -36,7 +36,6 @@
 #include "library/pow.hpp"
 #include "library/powx.hpp"
 #include "library/sin.hpp"
-#include "library/sincospi.hpp"
 #include "library/sind.hpp"
 #include "library/sinh.hpp"
 #include "library/sinpi.hpp"

@@ -129,7 +129,8 @@ class array_loop {
     lumen_arr_error_record record{};
     record.code = std::countr_zero(mask) + 1;
     record.index = index;
-    for (std::size_t k = 0; k < std::min(Shape::inputs, 2); ++k)
+    constexpr std::size_t arguments_told = Shape::inputs < 2 ? Shape::inputs : 2;
+    for (std::size_t k = 0; k < arguments_told; ++k)
       note(*element.in[k], record.argument[k], record.argument_imag[k]);
     for (std::size_t j = 0; j < Shape::outputs; ++j)
       note(*element.out[j], record.result[j], record.result_imag[j]);

@@ -15,7 +15,7 @@ int main() {
   const bool copy_sign = true;
   const vm::error_handler<float> handler(0.0f, vm::enums::sing, copy_sign);
 
-  // Kernels replace results, host loops do not. With cyclic slices a CPU runs the kernel, too; each
+  // Kernels replace results, the host does not. With cyclic slices a CPU runs the kernel, too; each
   // element of a meets each of b.
   vm::fmod(queue, a, {0, 2, 1}, b, {0, 2, 1}, y, {0, 4, 1}, {}, vm::enums::slice_cyclic, handler)
       .wait();

@@ -16,7 +16,7 @@ int main() {
   std::vector<vm::enums::status> status(3, vm::enums::success);  // one for each element
   const vm::error_handler<float> handler(status.data(), 3);
 
-  // Kernels report status, host loops do not. With cyclic slices a CPU runs the kernel, too.
+  // Kernels report status, the host does not. With cyclic slices a CPU runs the kernel, too.
   vm::nextafter(queue, a, {0, 3, 1}, up, {0, 1, 1}, y, {0, 3, 1}, {}, vm::enums::slice_cyclic,
                 handler)
       .wait();

@@ -45,6 +45,21 @@ struct wrapped {
   }
 };
 
+/// Two kernels in a row as one of two results. The one that would overwrite the input comes last.
+template <typename T, auto First, auto Second>
+void both(std::int64_t n, const T* a, T* y, T* z, std::int64_t mode) {
+  if (a != y) First(n, a, y, mode);
+  Second(n, a, z, mode);
+  if (a == y) First(n, a, y, mode);
+}
+template <typename T, auto First, auto Second>
+void both_strided(std::int64_t n, const T* a, std::int64_t inca, T* y, std::int64_t incy, T* z,
+                  std::int64_t incz, std::int64_t mode) {
+  if (a != y) First(n, a, inca, y, incy, mode);
+  Second(n, a, inca, z, incz, mode);
+  if (a == y) First(n, a, inca, y, incy, mode);
+}
+
 /// The launcher of a host row, as family tables hold it.
 template <typename Shape, typename T, typename U, auto Linear, auto Strided, std::int64_t Mode,
           error_kind Errors>

@@ -145,17 +145,6 @@ TYPED_TEST(LibrarySpecial, TrigonometryInMultiplesOfPi) {
   expect<lib::tanpi<T>>(nan<T>, nan<T>);
 }
 
-TYPED_TEST(LibrarySpecial, SincospiIsSinpiAndCospi) {
-  using T = TypeParam;
-  for (const T x : {T(0), T(-0.0), T(0.5), T(-1), T(0.3), largest<T>, inf<T>, -inf<T>, nan<T>}) {
-    T sine, cosine;
-    lib::sinpi<T>::call(&x, &sine);
-    lib::cospi<T>::call(&x, &cosine);
-    expect_v12<lib::sincospi<T>>(std::bit_cast<part_of<T>>(x), expected(sine), expected(cosine),
-                                 std::isinf(x) ? domain : 0);
-  }
-}
-
 TYPED_TEST(LibrarySpecial, ErrorFunctions) {
   using T = TypeParam;
   expect_odd<lib::erf<T>>(T(0), T(0));

@@ -40,7 +40,7 @@ class Case:
     n: int
 
 
-def times(path: Path) -> dict[Case, dict[str, float]]:
+def times(path: Path, clock: str = "cpu_time") -> dict[Case, dict[str, float]]:
     """Least time per element in ns, by case and implementation."""
     found: dict[Case, dict[str, float]] = defaultdict(dict)
     for run in json.loads(path.read_text())["benchmarks"]:
@@ -48,7 +48,7 @@ def times(path: Path) -> dict[Case, dict[str, float]]:
             continue
         function, letter, implementation, arguments, n = run["name"].split("/")[:5]
         case = Case(function, letter, arguments, int(n))
-        time = run["cpu_time"] / case.n
+        time = run[clock] / case.n
         found[case][implementation] = min(time, found[case].get(implementation, math.inf))
     return found
 
@@ -96,33 +96,22 @@ def geometric_means(found: dict[Case, dict[str, float]]) -> str:
     return "\n".join(lines) + "\n"
 
 
-def draw(found: dict[Case, dict[str, float]], title: str, path: Path) -> bool:
-    """Bars of the ratios at the smaller n, if gnuplot is there."""
+def draw_bars(rows: list[tuple[str, list[float]]], title: str, axis: str, path: Path) -> bool:
+    """Three bars for the tiers of each row, if gnuplot is there."""
     if shutil.which("gnuplot") is None:
         return False
-    lines = []
-    for case in sorted(found, key=lambda c: (c.function, c.type != "s")):
-        measured = found[case]
-        if case.arguments != "ordinary" or case.n != 4096 or REFERENCE not in measured:
-            continue
-        inherited: list[float] = []
-        cells = []
-        for tier in TIERS:
-            inherited = bodies(measured, tier)[:1] or inherited
-            cells.append(ratio(inherited[0], measured) if inherited else "0")
-        lines.append(f"{case.function}_{case.type} " + " ".join(cells))
-    data = "\n".join(lines)
+    data = "\n".join(f"{name} " + " ".join(f"{v:.3f}" for v in values) for name, values in rows)
     script = f"""$data << END
 {data}
 END
-set terminal svg size {200 + 28 * len(lines)},420 font 'sans,11'
+set terminal svg size {200 + 28 * len(rows)},420 font 'sans,11'
 set output '{path}'
 set title '{title}' noenhanced
 set style data histogram
 set style histogram clustered gap 1
 set style fill solid 0.9
 set xtics rotate by -60 noenhanced
-set ylabel 'time / time of SLEEF, 1 ulp'
+set ylabel '{axis}'
 set yrange [0:1.2]
 set grid ytics
 set key top right
@@ -131,6 +120,22 @@ plot $data using 2:xtic(1) title 'ha' lc rgb '#1b6ca8', $data using 3 title 'la'
 """
     subprocess.run(["gnuplot"], input=script, text=True, check=True)
     return True
+
+
+def draw(found: dict[Case, dict[str, float]], title: str, path: Path) -> bool:
+    """The ratios at the smaller n."""
+    rows = []
+    for case in sorted(found, key=lambda c: (c.function, c.type != "s")):
+        measured = found[case]
+        if case.arguments != "ordinary" or case.n != 4096 or REFERENCE not in measured:
+            continue
+        inherited: list[float] = []
+        values = []
+        for tier in TIERS:
+            inherited = bodies(measured, tier)[:1] or inherited
+            values.append(inherited[0] / measured[REFERENCE] if inherited else 0)
+        rows.append((f"{case.function}_{case.type}", values))
+    return draw_bars(rows, title, "time / time of SLEEF, 1 ulp", path)
 
 
 def processor(path: Path) -> str:

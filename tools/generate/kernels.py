@@ -10,11 +10,6 @@ from dataclasses import dataclass
 from catalogue import ELEMENT_TYPES, TIERS, Function, HostRow, Parameter
 from output import Output
 
-# Classes of processors in the order of the tables.
-CLASSES = ("baseline", "avx2", "avx512")
-# Of kernels made from other libraries: compiled once, the same in every class.
-ANY_CLASS = "any"
-
 # About the nanoseconds for one element, float and double; the threading layer weighs them.
 _COST = {
     "exact": (0.25, 0.5),
@@ -43,7 +38,7 @@ class Kernel:
     function: Function
     letter: str
     base: str  # the function's name in the module
-    functors: tuple[str, ...]  # for ha, la, ep
+    functors: tuple[str, ...] | None  # for ha, la, ep; None for a pair of other kernels
     from_library: bool
 
     @property
@@ -59,14 +54,27 @@ class Kernel:
         return self.function.output_letter(self.input_letter)
 
     @property
+    def pair(self) -> list[str]:
+        """The two kernels that a row runs in place of one of its own; else empty."""
+        bases = self.base.split(" + ")
+        return [self.letter + base for base in bases] if len(bases) == 2 else []
+
+    @property
     def wrapper(self) -> str:
-        """The function of the binding that reaches it."""
-        return "v" + self.name
+        """What reaches it through the binding, for messages."""
+        return " + ".join("v" + name for name in self.pair or [self.name])
 
     @property
     def entries(self) -> str:
         """The wrappers without and with increments, as template arguments."""
-        return f"&cpu::binding::{self.wrapper}, &cpu::binding::{self.wrapper}I"
+        wrappers = [f"&cpu::binding::v{name}" for name in self.pair or [self.name]]
+        with_increments = [wrapper + "I" for wrapper in wrappers]
+        if not self.pair:
+            return f"{wrappers[0]}, {with_increments[0]}"
+        element = ELEMENT_TYPES[self.letter]
+        both = f"&cpu::norvane::both<{element}, {', '.join(wrappers)}>"
+        strided = f"&cpu::norvane::both_strided<{element}, {', '.join(with_increments)}>"
+        return f"{both}, {strided}"
 
     @property
     def threader(self) -> str:
@@ -147,7 +155,7 @@ def _functors(function: Function, letter: str, rows: list[HostRow]) -> tuple[str
 
 
 def kernels_of(function: Function) -> list[Kernel]:
-    """Those of one function that exist."""
+    """What serves the host rows of one function, as far as it exists."""
     if function.utility:
         return []
     kernels = []
@@ -157,7 +165,7 @@ def kernels_of(function: Function) -> list[Kernel]:
         if from_library:
             element = ELEMENT_TYPES[function.input_letter(letter)]
             functors = (f"library::{function.name}<{element}>",) * len(TIERS)
-        if functors is not None and "+" not in base:
+        if functors is not None or "+" in base:
             kernels.append(Kernel(function, letter, base, functors, from_library))
     return kernels
 
@@ -224,7 +232,7 @@ def _wrappers(kernels: list[Kernel]) -> str:
 def generate(functions: list[Function], output: Output) -> None:
     kernels = []
     for function in functions:
-        of_function = kernels_of(function)
+        of_function = [kernel for kernel in kernels_of(function) if not kernel.pair]
         kernels += of_function
         own = [kernel for kernel in of_function if not kernel.from_library]
         if own:
@@ -233,8 +241,7 @@ def generate(functions: list[Function], output: Output) -> None:
             output.cpp(f"arrmath/kernels/{function.name}.cpp", _unit(own, include, using))
     library = [kernel for kernel in kernels if kernel.from_library]
     using = "namespace library = vm::detail::library;\n"
-    if library:
-        output.cpp("arrmath/library_kernels.cpp", _unit(library, "library/functions.hpp", using))
+    output.cpp("arrmath/library_kernels.cpp", _unit(library, "library/functions.hpp", using))
     output.cpp("arrmath/tables.cpp", _tables(kernels))
     output.cpp("tests/kernel_list.hpp", _list(kernels))
     output.cpp("src/host/kernels.hpp", _declarations(kernels))

@@ -106,9 +106,10 @@ struct exp_z : scalar_v11<exp_z<t>, std::complex<double>> {
 
  private:
   LUMEN_MAIN bool is_ordinary(complex z) {
-    const bool in_range =
-        (z.real() > value(0xc086232a00000000u)) & (z.real() < value(0x4090a00000000000u));
-    return in_range & is_short_turn(fabs(z.imag()));
+    const bool above = z.real() > value(0xc086232a00000000u);
+    const bool below = z.real() < value(0x4090a00000000000u);
+    const bool is_short = is_short_turn(fabs(z.imag()));
+    return above & below & is_short;
   }
 
   LUMEN_MAIN complex product(complex z) {

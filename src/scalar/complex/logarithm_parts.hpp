@@ -76,7 +76,8 @@ LUMEN_DEVICE inline std::complex<R> special_logarithm(std::complex<R> z) {
 /// Both parts zero, or one of them an infinity or a NaN.
 template <typename R>
 LUMEN_MAIN bool has_special_logarithm(const quadrant<R>& p) {
-  return (bits(p.larger) == 0) | (bits(p.larger) >= format<R>::special);
+  const auto larger = bits(p.larger);
+  return (larger == 0) | (larger >= format<R>::special);
 }
 
 }  // namespace arbor::lumen::vm::detail::gpu::norvane::scalar
