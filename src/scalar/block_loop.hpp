@@ -146,7 +146,9 @@ class block_loop {
       return nullptr;
   }
 
-  /// The flags alone, once more, and the rare path where one is set.
+  /// The flags alone, once more, and the rare path where one is set. Where the body has a main path
+  /// for arguments beyond the first one's reach, and many of a whole block are flagged, that one
+  /// goes before.
   [[gnu::noinline, gnu::cold]] static std::uint32_t repair(std::int64_t count,
                                                            const T* __restrict a,
                                                            const T* __restrict b, U* __restrict y,
@@ -154,10 +156,27 @@ class block_loop {
     flag flags[length];
     std::uint32_t status = 0;
     for (std::int64_t i = 0; i < count; ++i) flags[i] = main(a, b, i).rare;
+    if constexpr (requires(T x) { Body::beyond(x); }) {
+      if (count == length && length - std::count(flags, flags + length, 0) > length / 8)
+        beyond(a, y, flags);
+    }
     for (std::int64_t i = 0; i < count; ++i) {
       if (flags[i] != 0) status |= rare(a, b, y, z, i);
     }
     return status;
+  }
+
+  /// The second main path for the flagged elements; leaves the flags of those it does not serve.
+  [[gnu::noinline]] static void beyond(const T* __restrict a, U* __restrict y,
+                                       flag* __restrict flags) {
+    [[maybe_unused]] constexpr int in_flight = 2;
+    LUMEN_BLOCK_LOOP
+    for (std::int64_t i = 0; i < length; ++i) {
+      const auto result = Body::beyond(load(a + i));
+      const bool served = flags[i] == 0;
+      store(y + i, select(served, load(y + i), result.value));
+      flags[i] = select(served, flag{0}, result.rare);
+    }
   }
 
   /// Elements that are apart, fewer than a block, or written over an input: through local blocks.

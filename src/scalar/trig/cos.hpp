@@ -80,9 +80,18 @@ struct cos_d : scalar_v11<cos_d<t>, double> {
     if constexpr (t == tier::la) {
       *y = sine_of_step(turn_step::nearest(x), 128);
     } else {
-      *y = sine_of_octants(x, 16);
+      *y = sine_of_octants(octant_rest::of(x), 16);
     }
     return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    if constexpr (t == tier::la) {
+      return {sine_of_step(turn_step::nearest(x), 128), flag_if<double>(is_special(x))};
+    } else {
+      return {sine_of_octants(octant_rest::of_sliced(x), 16),
+              flag_if<double>(octant_rest::is_not_sliced(x))};
+    }
   }
 
  private:
@@ -117,15 +126,23 @@ struct cos_d<tier::ha> : scalar_v11<cos_d<tier::ha>, double> {
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return quiet_of_special(x, y);
-    const auto s = quarter_turn::nearest(fabs(x));
-    const bool even = !is_odd(s.quarters);
-    const double result =
-        even ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
-    *y = value(bits(result) ^ sign(s.quarters));
+    *y = long_cosine(quarter_turn::nearest(fabs(x)));
     return mask(code::none);
   }
 
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    bool next_to_quarter;
+    const auto s = quarter_turn::nearest_without_branch(fabs(x), next_to_quarter);
+    return {long_cosine(s), flag_if<double>(next_to_quarter, is_special(x))};
+  }
+
  private:
+  LUMEN_MAIN double long_cosine(const quarter_turn& s) {
+    const double y = select(is_odd(s.quarters), long_sine_kernel(s.rest, s.rest_low),
+                            long_cosine_kernel(s.rest, s.rest_low));
+    return value(bits(y) ^ sign(s.quarters));
+  }
+
   /// Negative in the second and third quadrant.
   LUMEN_MAIN std::uint64_t sign(std::uint64_t quarters) {
     return ((quarters ^ (quarters >> 1)) << 63);

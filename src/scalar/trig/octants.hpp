@@ -8,8 +8,10 @@
 
 #include "scalar/complex/double_double.hpp"
 #include "scalar/horner.hpp"
+#include "scalar/log/reduction.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/tables/dsin.hpp"
+#include "scalar/trig/parity.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
@@ -23,19 +25,34 @@ struct octant_rest {
   /// For finite |x| >= 2^23.
   LUMEN_DEVICE static octant_rest of(double x) {
     const double a = fabs(x);
-    const placed p = a < value(0x41d0000000000000u) ? by_parts_of_pi(a) : by_slices(a);
-    const std::uint64_t negative = bits(x) >> 63;
-    const double sign = entry(2 + static_cast<std::int32_t>(negative));
-    const double_double rest = two_sum(sign * p.rest.high, sign * p.rest.low);
-    const std::uint64_t quarters = (p.octant + 1) >> 1;
-    return {quarters * (1 - 2 * negative), rest.high, rest.low};
+    return of_placed(a < value(slices_from) ? by_parts_of_pi(a) : by_slices(a), x);
+  }
+
+  /// For finite |x| >= 2^30; some number for all others.
+  LUMEN_MAIN octant_rest of_sliced(double x) {
+    const double a = fabs(x);
+    return of_placed(by_slices(select(a >= value(slices_from), a, value(slices_from))), x);
+  }
+  LUMEN_MAIN bool is_not_sliced(double x) {
+    return is_outside(fabs(x), slices_from, 0x7fefffffffffffffu);
   }
 
  private:
+  static constexpr std::uint64_t slices_from = 0x41d0000000000000;  // 2^30
+
   struct placed {
     std::uint64_t octant;
     double_double rest;
   };
+
+  LUMEN_MAIN octant_rest of_placed(const placed& p, double x) {
+    const std::uint64_t sign = sign_bit(x);
+    const double_double rest =
+        two_sum(value(bits(p.rest.high) ^ sign), value(bits(p.rest.low) ^ sign));
+    const std::uint64_t quarters = (p.octant + 1) >> 1;
+    const std::uint64_t negative = sign >> 63;
+    return {(quarters ^ (0 - negative)) + negative, rest.high, rest.low};
+  }
 
   LUMEN_DEVICE static double entry(std::int32_t i) { return value(__dsin_ep_ReductionTab[i]); }
 
@@ -58,56 +75,60 @@ struct octant_rest {
   /// two lose multiples of the turn. The octant is split off as soon as the products that follow
   /// are below 2^-20, and the two words of the sum stay normalised, so that arguments next to a
   /// multiple of pi/2 keep their bits.
-  LUMEN_DEVICE static placed by_slices(double a) {
+  LUMEN_MAIN placed by_slices(double a) {
     const std::uint64_t scale = std::uint64_t{200} << 52;  // taken from a, put on the slices
     const double scaled = value(bits(a) - scale);
     const double high = value(bits(scaled) & 0xfffffffff8000000u);  // 26 bits
     const double low = scaled - high;
     const std::uint64_t place = (bits(a) >> 52) - 1052;
-    const std::uint64_t i = (place * 0x147aeu) >> 21;  // place/25
-    const auto word = static_cast<std::int32_t>(19 + i);
+    const std::uint64_t i = (static_cast<std::uint32_t>(place) * std::uint64_t{0x147ae}) >> 21;
+    const std::uint64_t* slices = __dsin_ep_ReductionTab + static_cast<std::int32_t>(19 + i);
 
-    double sum = low * entry(word);
-    double rest = 0.0;
-    const auto add = [&sum, &rest](double term) {
-      const double_double s = two_sum(sum, term);
-      const double_double both = two_sum(s.high, rest + s.low);
-      sum = both.high;
-      rest = both.low;
-    };
-    const auto add_pair = [&](std::int32_t k) {
-      add(low * entry(word + k));
-      add(high * entry(word + k + 1));
-    };
-    add(high * entry(word + 1));
-    const std::uint64_t cut = 38 - (place - 25 * i);
-    sum -= value(bits(sum) & (~std::uint64_t{0} << cut));
-    for (std::int32_t k = 1; k < 3; ++k) add_pair(k);
-    const std::uint64_t octant = integer_part(sum);
-    sum -= static_cast<double>(octant);
-    add(entry(static_cast<std::int32_t>(octant & 1u)));
-    for (std::int32_t k = 3; k < 8; ++k) add_pair(k);
+    double_double sum = {low * value(slices[0]), 0.0};
+    sum = plus(sum, high * value(slices[1]));
+    const std::uint64_t cut = 38 - (place - 25 * i);  // place/25 is i
+    sum.high -= value(bits(sum.high) & (~std::uint64_t{0} << cut));
+    sum = plus_slices<1>(sum, low, high, slices);
+    sum = plus_slices<2>(sum, low, high, slices);
+    const std::uint64_t octant = integer_part(sum.high);
+    sum.high -= small_integer(octant);
+    sum = plus(sum, select(is_odd(octant), -1.0, 0.0));
+    sum = plus_slices<3>(sum, low, high, slices);
+    sum = plus_slices<4>(sum, low, high, slices);
+    sum = plus_slices<5>(sum, low, high, slices);
+    sum = plus_slices<6>(sum, low, high, slices);
+    sum = plus_slices<7>(sum, low, high, slices);
 
     // Times pi/4, the leading 27 bits exactly.
-    const double leading = (sum + entry(4)) - entry(4);
-    const double behind = (sum - leading) + rest;
+    const double leading = (sum.high + entry(4)) - entry(4);
+    const double behind = (sum.high - leading) + sum.low;
     const double product = leading * entry(6);
     const double product_low = mad(behind, entry(6), mad(leading, entry(7), behind * entry(7)));
     return {octant, {product, product_low}};
   }
 
+  LUMEN_MAIN double_double plus(double_double sum, double term) {
+    const double_double s = two_sum(sum.high, term);
+    return two_sum(s.high, sum.low + s.low);
+  }
+
+  template <int k>
+  LUMEN_MAIN double_double plus_slices(double_double sum, double low, double high,
+                                       const std::uint64_t* slices) {
+    return plus(plus(sum, low * value(slices[k])), high * value(slices[k + 1]));
+  }
+
   /// floor(sum) of 0 <= sum < 2^52.
-  LUMEN_DEVICE static std::uint64_t integer_part(double sum) {
+  LUMEN_MAIN std::uint64_t integer_part(double sum) {
     const std::uint64_t shift = 1075 - (bits(sum) >> 52);
     const std::uint64_t mantissa = (bits(sum) & format<double>::fraction) | 0x0010000000000000u;
-    return shift < 64 ? mantissa >> shift : 0;
+    return select(shift < 64, mantissa >> (shift & 63u), std::uint64_t{0});
   }
 };
 
-/// The sine of x and 2 pi shift/64; with a shift of 16 the cosine of x. From a row of a table for
-/// the nearest of 64 steps of the turn, degree 9 and 8.
-LUMEN_DEVICE inline double sine_of_octants(double x, std::int32_t shift) {
-  const octant_rest a = octant_rest::of(x);
+/// The sine of the place a and 2 pi shift/64; with a shift of 16 the cosine. From a row of a table
+/// for the nearest of 64 steps of the turn, degree 9 and 8.
+LUMEN_MAIN double sine_of_octants(const octant_rest& a, std::int32_t shift) {
   const double shifter = value(0x4338000000000000u);  // 3·2^51
   const double c = a.rest * value(0x40245f306dc9c883u) + shifter;
   const double m = c - shifter;

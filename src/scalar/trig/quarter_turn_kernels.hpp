@@ -59,11 +59,11 @@ LUMEN_MAIN double cosine_kernel(double r, double low, double z, double q) {
 }
 
 /// sin and cos of rest + low behind the long reduction; the cubic term is rounded otherwise.
-LUMEN_DEVICE inline double long_sine_kernel(double r, double low) {
+LUMEN_MAIN double long_sine_kernel(double r, double low) {
   const double z = r * r;
   return fma(r * z, quarter_turn_series::of_sine(z), low) + r;
 }
-LUMEN_DEVICE inline double long_cosine_kernel(double r, double low) {
+LUMEN_MAIN double long_cosine_kernel(double r, double low) {
   const double z = r * r;
   return cosine_kernel(r, low, z, quarter_turn_series::of_cosine(z) * z);
 }

@@ -78,9 +78,19 @@ struct sin_d : scalar_v11<sin_d<t>, double> {
       const double sine = sine_of_step(turn_step::nearest(fabs(x)), 0);
       *y = value(bits(sine) ^ sign_bit(x));
     } else {
-      *y = sine_of_octants(x, 0);
+      *y = sine_of_octants(octant_rest::of(x), 0);
     }
     return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    if constexpr (t == tier::la) {
+      const double sine = sine_of_step(turn_step::nearest(fabs(x)), 0);
+      return {value(bits(sine) ^ sign_bit(x)), flag_if<double>(is_special(x))};
+    } else {
+      return {sine_of_octants(octant_rest::of_sliced(x), 0),
+              flag_if<double>(octant_rest::is_not_sliced(x))};
+    }
   }
 
  private:
@@ -115,13 +125,21 @@ struct sin_d<tier::ha> : scalar_v11<sin_d<tier::ha>, double> {
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return quiet_of_special(x, y);
-    const auto s = quarter_turn::nearest(fabs(x));
-    const bool odd = is_odd(s.quarters);
-    const double result =
-        odd ? long_cosine_kernel(s.rest, s.rest_low) : long_sine_kernel(s.rest, s.rest_low);
-    const std::uint64_t sign = ((s.quarters << 62) ^ bits(x)) & format<double>::sign;
-    *y = value(bits(result) ^ sign);
+    *y = long_sine(quarter_turn::nearest(fabs(x)), x);
     return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    bool next_to_quarter;
+    const auto s = quarter_turn::nearest_without_branch(fabs(x), next_to_quarter);
+    return {long_sine(s, x), flag_if<double>(next_to_quarter, is_special(x))};
+  }
+
+ private:
+  LUMEN_MAIN double long_sine(const quarter_turn& s, double x) {
+    const double y = select(is_odd(s.quarters), long_cosine_kernel(s.rest, s.rest_low),
+                            long_sine_kernel(s.rest, s.rest_low));
+    return value(bits(y) ^ (((s.quarters << 62) ^ bits(x)) & format<double>::sign));
   }
 };
 

@@ -129,7 +129,18 @@ struct tan_d : scalar_v11<tan_d<t>, double> {
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return quiet_of_special(x, y);
-    const auto s = quarter_turn::nearest(fabs(x));
+    *y = long_tangent(quarter_turn::nearest(fabs(x)), x);
+    return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    bool next_to_quarter;
+    const auto s = quarter_turn::nearest_without_branch(fabs(x), next_to_quarter);
+    return {long_tangent(s, x), flag_if<double>(next_to_quarter, is_special(x))};
+  }
+
+ private:
+  LUMEN_MAIN double long_tangent(const quarter_turn& s, double x) {
     const double r = s.rest;
     const double z = r * r;
     const double q = horner(z, 0xbdf64c1ef7b9f88fu, 0xbe2209d9df00def0u, 0xbe57fdc92b36f96fu,
@@ -137,12 +148,10 @@ struct tan_d : scalar_v11<tan_d<t>, double> {
                             0xbf2bbd7794a1b07du, 0xbf61566abbff502au, 0xbf96c16c16c16e58u);
     const double divisor = fma(z, fma(z, q, value(0xbfd5555555555555u)), 1.0);
     const bool odd = is_odd(s.quarters);
-    const double quotient = odd ? divide(divisor, r) : divide(r, divisor);
-    *y = value(bits(quotient) ^ (s.quarters << 63) ^ sign_bit(x));
-    return mask(code::none);
+    const double quotient = divide(select(odd, divisor, r), select(odd, r, divisor));
+    return value(bits(quotient) ^ (s.quarters << 63) ^ sign_bit(x));
   }
 
- private:
   /// r/tan r from z = r^2.
   LUMEN_MAIN double denominator(double z) {
     if constexpr (t == tier::la) {
@@ -185,20 +194,27 @@ struct tan_d<tier::ha> : scalar_v11<tan_d<tier::ha>, double> {
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     if (is_special(x)) return product_of_special(x, y);
-    const turn_step a = turn_step::nearest(x);
+    *y = of_step(turn_step::nearest(x));
+    return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<double> beyond(double x) {
+    return {of_step(turn_step::nearest(x)), flag_if<double>(is_special(x))};
+  }
+
+ private:
+  LUMEN_MAIN double of_step(const turn_step& a) {
     // From the step of pi/256 to the nearest one of pi/16, the half going by the sign of the rest.
-    const std::int32_t behind = a.rest < 0 ? 1 : 0;
+    const std::int32_t behind = select(a.rest < 0, 1, 0);
     const std::int32_t centred = a.step - behind + 8;
     const auto steps = static_cast<double>(a.step - (centred & ~15));
     const double unit = value(0x3f8921fb54442d18u);  // pi/256
     const double r = fma(steps, unit, a.rest);
     const double error = a.rest - fma(-steps, unit, r);
     const double low = fma(steps, value(0x3c21a62633145c07u), error) + a.rest_low;
-    *y = of_sixteenth((centred >> 4) & 15, r, low);
-    return mask(code::none);
+    return of_sixteenth((centred >> 4) & 15, r, low);
   }
 
- private:
   /// tan(k pi/16 + r + low).
   LUMEN_MAIN double of_sixteenth(std::int64_t k, double r, double low) {
     const double t = value(internal_dtan_ha_data[6 + k]);

@@ -21,7 +21,7 @@ struct turn_step {
   double rest_low;
 
   /// For finite x.
-  LUMEN_DEVICE static turn_step nearest(double x) {
+  LUMEN_MAIN turn_step nearest(double x) {
     const std::uint64_t sign = sign_bit(x);
     const fraction f = fraction_of_turn(fabs(x));
     const double v = value((f.first >> 12) | format<double>::one | sign);  // ±(1 + the turn)
@@ -49,13 +49,13 @@ struct turn_step {
   };
 
   /// The double of the exponent in `unit` with that fraction, less 1 of its exponent.
-  LUMEN_DEVICE static double digits(std::uint64_t fraction, std::uint64_t unit) {
+  LUMEN_MAIN double digits(std::uint64_t fraction, std::uint64_t unit) {
     return value(fraction | unit) - value(unit);
   }
 
   /// The 53 bits of a by its row, in digits of 32 bits. What is above the turn does not count, and
   /// products below the sixth digit only by their carry.
-  LUMEN_DEVICE static fraction fraction_of_turn(double a) {
+  LUMEN_MAIN fraction fraction_of_turn(double a) {
     const std::uint64_t* row = internal_dsin_la_reduction_data + 3 * (bits(a) >> 52);
     const std::uint64_t m_high = ((bits(a) >> 32) & 0x000fffffu) | 0x00100000u;
     const std::uint64_t m_low = bits(a) & low_half;
@@ -82,7 +82,7 @@ struct turn_step {
 
 /// The sine of 2 pi (step + shift)/512 + rest, within 0.51 ulp; with a shift of a quarter turn,
 /// 128, the cosine of the argument.
-LUMEN_DEVICE inline double sine_of_step(const turn_step& a, std::int32_t shift) {
+LUMEN_MAIN double sine_of_step(const turn_step& a, std::int32_t shift) {
   const std::uint64_t* row = internal_dsin_la_data_ha + 4 * ((a.step + shift) & 511);
   // H + D is the derivative of S + T; H is a power of two, so that z H is exact.
   const double d = value(row[0]), h = value(row[1]), s = value(row[2]), t = value(row[3]);
