@@ -16,12 +16,12 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// How many vectors of a body are in flight at once: four hide the latency of the chains of fma,
-/// unless the body says that so many do not fit into the registers.
+/// How many vectors of a body are in flight at once: with two, most bodies fit into the registers;
+/// one that is a single long chain of fma says that it needs four to hide their latency.
 template <typename Body>
 constexpr int interleave() {
   if constexpr (requires { Body::interleave; }) return Body::interleave;
-  return 4;
+  return 2;
 }
 
 #if defined(__clang__)

@@ -120,6 +120,8 @@ struct atan_d<tier::la> : scalar_v11<atan_d<tier::la>, double> {
 
 /// Without a table: x itself up to 1, pi/2 + arctan(-1/x) beyond. Largest error 2.2 ulp.
 struct atan_d_nolut : scalar_v11<atan_d_nolut, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     const bool direct = fabs(x) <= 1.0;
     const double t = select(direct, x, divide(-1.0, x));
@@ -150,6 +152,8 @@ struct atan_d<tier::ep> : scalar_v11<atan_d<tier::ep>, double> {
 /// it needs no table.
 template <>
 struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     const auto s = tangent_segment::of(fabs(x));
     const double high = value(internal_datan_ha_data[s.row + 2]);

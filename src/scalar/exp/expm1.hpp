@@ -258,6 +258,8 @@ struct expm1_d : expm1_d_paths<expm1_d<t>> {
 /// 1 in double-word arithmetic.
 template <>
 struct expm1_d<tier::ha> : expm1_d_paths<expm1_d<tier::ha>> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN double difference(double x) {
     const words a = reduce(x);
     const double s = value(a.scale);

@@ -65,6 +65,8 @@ struct ln_s : scalar_v11<ln_s<t>, float> {
 /// Largest error 1.5 and 4.0e7 ulp.
 template <tier t>
 struct ln_d : scalar_v11<ln_d<t>, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     const auto a = two_thirds<double>::of(x);
     const double q = polynomial(a.r);

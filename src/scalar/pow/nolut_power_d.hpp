@@ -22,6 +22,8 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// exponential is that of exp.
 template <tier t>
 struct nolut_power_d {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x, double y) {
     const words l = ln_of(x);
     const double p = fma(y, l.high, 0.0);

@@ -12,9 +12,7 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// A power put together: a main path, which may serve a band of its own on the rare path; what
 /// holds for special operands; and the power of what these leave over.
 template <typename T, typename Main, typename Specials, typename Others>
-struct power_paths {
-  LUMEN_MAIN main_result<T> main(T x, T y) { return Main::main(x, y); }
-
+struct power_paths : Main {
   LUMEN_RARE std::uint32_t rare(T x, T y, T* r) {
     if constexpr (requires { Main::serve_band(x, y, r); }) {
       if (Main::serve_band(x, y, r)) return mask(code::none);

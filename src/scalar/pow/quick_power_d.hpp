@@ -17,6 +17,8 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// The exponential has a row of 2^(i/2048), rounded down, and the chord to the next one in place of
 /// a polynomial: at most 1.43e-8 of the result above it.
 struct quick_power_d {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x, double y) {
     const auto a = integer_reciprocal::of(x);
     const double row = value(internal_dpow_ep_data[integer_reciprocal::single_word(a)]);

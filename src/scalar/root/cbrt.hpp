@@ -139,6 +139,8 @@ struct cbrt_polynomial_d {
 /// in two words, 7, 3.
 template <tier t>
 struct cbrt_s : scalar_v11<cbrt_s<t>, float> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<float> main(float x) {
     return {cube_root<float>::of<cbrt_polynomial_s<t>, t == tier::ha>(x)};
   }
@@ -148,6 +150,8 @@ struct cbrt_s : scalar_v11<cbrt_s<t>, float> {
 /// degree 20 with 2^(k/3) in two words, 18, 13.
 template <tier t>
 struct cbrt_d : scalar_v11<cbrt_d<t>, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     return {cube_root<double>::of<cbrt_polynomial_d<t>, false>(x)};
   }
@@ -157,6 +161,8 @@ struct cbrt_d : scalar_v11<cbrt_d<t>, double> {
 /// part i, and so 0 unless i is one of 1 to 8.
 template <>
 struct cbrt_d<tier::ha> : scalar_v11<cbrt_d<tier::ha>, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     const double y = cube_root<double>::of<cbrt_polynomial_d<tier::ha>, true>(x);
     const bool from_one = y >= 1.0;

@@ -112,6 +112,8 @@ struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
 /// NaN loses its sign.
 template <tier t>
 struct tan_d : scalar_v11<tan_d<t>, double> {
+  static constexpr int interleave = 4;
+
   LUMEN_MAIN main_result<double> main(double x) {
     const double a = fabs(x);
     const double shifter = value(0x4338000000000000u);  // 3·2^51
