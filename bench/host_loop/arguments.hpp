@@ -81,9 +81,10 @@ inline const arguments* arguments_of(std::string_view function) {
   return nullptr;
 }
 
-/// Random arguments: uniform in value, or in the logarithm of it.
+/// Random arguments: uniform in value, or in the logarithm of it. Zeros where there is no interval.
 template <typename T>
 std::vector<T> draw(const interval& from, std::int64_t n, std::uint64_t seed) {
+  if (from.low == from.high) return std::vector<T>(static_cast<std::size_t>(n));
   std::mt19937_64 engine(seed);
   const bool logarithmic = from.how == spacing::logarithmic;
   std::uniform_real_distribution<double> values(logarithmic ? std::log(from.low) : from.low,

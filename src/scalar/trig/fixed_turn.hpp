@@ -57,10 +57,12 @@ struct turn_rest {
 /// of the quarter turn that no bit is left to shift.
 template <int removed>
 LUMEN_MAIN turn_rest rest_of_turn(std::uint64_t place) {
-  const std::uint32_t top = static_cast<std::uint32_t>(place >> 32) << removed;
+  const auto high = static_cast<std::uint32_t>(place >> 32);
+  const auto low = static_cast<std::uint32_t>(place);
+  const std::uint32_t top = high << removed;
   const std::uint32_t e = (bits(static_cast<float>(static_cast<std::int32_t>(top))) >> 23) & 0xffu;
-  const std::uint32_t shift = select(e < 158u, 157u + removed - e, std::uint32_t{removed});
-  const auto filled = static_cast<std::uint32_t>((place << (shift & 63u)) >> 32);
+  const std::uint32_t shift = select(e < 158u, 157u + removed - e, std::uint32_t{removed}) & 31u;
+  const std::uint32_t filled = (high << shift) + ((low >> 1) >> (31u - shift));
   const auto rounded = static_cast<float>(static_cast<std::int32_t>(filled));
   // An even integer, up to 2^31.
   const std::uint32_t back = static_cast<std::uint32_t>(static_cast<std::int32_t>(rounded * 0.5f))
