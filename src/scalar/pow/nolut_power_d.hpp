@@ -13,6 +13,9 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
+/// The form that serves a tier: `ha` has one of its own, `la` and `ep` share one.
+constexpr tier nolut_form(tier t) { return t == tier::ha ? tier::ha : tier::la; }
+
 /// x^y at double without a table: for positive normal x and |y·ln x| < 708.396.
 ///
 /// R, the integer of 4..8 next to the reciprocal of the mantissa, leaves t with |t| <= 1/9; its
@@ -31,8 +34,7 @@ struct nolut_power_d {
     p_low = fma(y, l.low, p_low);
     const double high = p + p_low;
     const double low = (p - high) + p_low;
-    constexpr tier exponential = t == tier::ha ? tier::ha : tier::la;
-    const auto power = half_step_factors_d<exponential>::of(high, low);
+    const auto power = half_step_factors_d<t>::of(high, low);
     const double scale = value(power.scale);
     const bool large = (bits(high) & format<double>::magnitude) >= 0x4086232b00000000u;
     return {fma(scale, power.rest, scale), flag_if<double>(not_positive_normal(x), large)};

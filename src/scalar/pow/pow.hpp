@@ -54,7 +54,7 @@ using pow_d = power_v21<double, pow_paths_d<pow_main_d<t>>>;
 /// Without a table on the main path; one body for `la` and `ep`. Largest error 0.95, 1.33 ulp for
 /// `ha`, `la`.
 template <tier t>
-using pow_d_nolut = power_v21<double, pow_paths_d<nolut_power_d<t>>>;
+using pow_d_nolut = power_v21<double, pow_paths_d<nolut_power_d<nolut_form(t)>>>;
 
 /// pow, half: the float body of `ep` in every tier.
 using pow_h = half_v21<pow_paths_s<tier::ep>>;

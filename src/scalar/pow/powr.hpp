@@ -52,7 +52,7 @@ using powr_d = power_v21<double, powr_paths_d<powr_main_d<t>>>;
 /// Without a table on the main path; one body for `la` and `ep`. Largest error 0.95, 1.33 ulp for
 /// `ha`, `la`.
 template <tier t>
-using powr_d_nolut = power_v21<double, powr_paths_d<nolut_power_d<t>>>;
+using powr_d_nolut = power_v21<double, powr_paths_d<nolut_power_d<nolut_form(t)>>>;
 
 /// powr, half: the float body of `ep` in every tier.
 using powr_h = half_v21<powr_of_tier_s<tier::ep>>;

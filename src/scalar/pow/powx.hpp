@@ -38,7 +38,7 @@ using powx_d = power_v21c<double, pow_paths_d<powx_main_d<t>>>;
 /// Without a table on the main path; one body for `la` and `ep`. Largest error 0.95, 1.33 ulp for
 /// `ha`, `la`.
 template <tier t>
-using powx_d_nolut = power_v21c<double, pow_paths_d<nolut_power_d<t>>>;
+using powx_d_nolut = power_v21c<double, pow_paths_d<nolut_power_d<nolut_form(t)>>>;
 
 /// powx, half: the float body of `ep` in every tier.
 using powx_h = half_v21c<powx_paths_s<tier::ep>>;
