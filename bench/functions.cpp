@@ -54,6 +54,7 @@ void run(benchmark::State& state, const detail::family& family, const sycl::devi
                                                        arbor::lumen::vm::enums::not_defined);
     call.in(a.get());
     if constexpr (Shape::inputs > 1) call.in(b.get());
+    for (int c = 0; c < Shape::constants; ++c) call.constant(ordinary<T>(c, 2));
     call.out(y.get());
     if constexpr (Shape::outputs > 1) call.out(z.get());
     call.run(family.dispatch).wait();
@@ -77,7 +78,11 @@ void add(const detail::family& family, const std::string& letter) {
       if (shape == "v11") run<detail::shape::v11, T, U>(state, family, device);
       if constexpr (std::is_same_v<T, U>) {
         if (shape == "v21") run<detail::shape::v21, T, U>(state, family, device);
+        if (shape == "v21c") run<detail::shape::v21c, T, U>(state, family, device);
         if (shape == "v12") run<detail::shape::v12, T, U>(state, family, device);
+        if constexpr (std::is_same_v<T, float> || std::is_same_v<T, double>) {
+          if (shape == "v61") run<detail::shape::v61, T, U>(state, family, device);
+        }
       }
     };
     benchmark::RegisterBenchmark(name.c_str(), body)->UseRealTime();

@@ -7,11 +7,13 @@
 #pragma once
 
 #include <algorithm>
-#include <concepts>
+#include <cstddef>
 #include <cstdint>
 #include <type_traits>
+#include <utility>
 
 #include "scalar/half.hpp"
+#include "scalar/half_conversion.hpp"
 #include "scalar/protocol.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
@@ -234,62 +236,48 @@ void block_loop_by_base(...);
 template <typename Functor>
 using block_loop_of = decltype(block_loop_by_base(static_cast<const Functor*>(nullptr)));
 
-/// A body on floats as a body on halves.
-template <typename Body, half_element Element>
-struct on_halves {
-  template <std::same_as<Element>... Operands>
-  LUMEN_MAIN auto main(Operands... x) {
-    const auto result = Body::main(load_half(&x)...);
-    if constexpr (requires { result.second; }) {
-      main_result2<Element> narrowed{{}, {}, result.rare};
-      store_half(&narrowed.first, result.first);
-      store_half(&narrowed.second, result.second);
-      return narrowed;
-    } else {
-      main_result<Element> narrowed{{}, result.rare};
-      store_half(&narrowed.value, result.value);
-      return narrowed;
-    }
+/// Halves by a body on floats: whole blocks are widened, computed and narrowed.
+template <typename Body, half_element Element, int Inputs, int Outputs>
+class half_block_loop {
+ public:
+  using input_type = Element;
+  using output_type = Element;
+  static constexpr int inputs = Inputs;
+  static constexpr int outputs = Outputs;
+
+  static std::uint32_t run(std::int64_t n, const Element* const (&in)[Inputs],
+                           Element* const (&out)[Outputs]) {
+    return run(n, in, out, std::make_index_sequence<Inputs>{}, std::make_index_sequence<Outputs>{});
   }
 
-  static std::uint32_t rare(Element x, Element* y) requires requires(float a) { Body::rare(a, &a); }
-  {
-    float result;
-    const std::uint32_t status = Body::rare(load_half(&x), &result);
-    store_half(y, result);
-    return status;
-  }
-  static std::uint32_t rare(Element a, Element b, Element* y) requires requires(float x) {
-    Body::rare(x, x, &x);
-  }
-  {
-    float result;
-    const std::uint32_t status = Body::rare(load_half(&a), load_half(&b), &result);
-    store_half(y, result);
-    return status;
-  }
-  static std::uint32_t rare(Element x, Element* y, Element* z) requires requires(float a) {
-    Body::rare(a, &a, &a);
-  }
-  {
-    float first, second;
-    const std::uint32_t status = Body::rare(load_half(&x), &first, &second);
-    store_half(y, first);
-    store_half(z, second);
+ private:
+  using float_loop = block_loop<Body, float, float, Inputs, Outputs>;
+  static constexpr std::int64_t length = 4 * float_loop::length;
+
+  template <std::size_t... I, std::size_t... O>
+  static std::uint32_t run(std::int64_t n, const Element* const (&in)[Inputs],
+                           Element* const (&out)[Outputs], std::index_sequence<I...>,
+                           std::index_sequence<O...>) {
+    float a[Inputs][length];
+    float y[Outputs][length];
+    std::uint32_t status = 0;
+    for (std::int64_t first = 0; first < n; first += length) {
+      const std::int64_t count = std::min(length, n - first);
+      (widen_block(in[I] + first, a[I], count), ...);
+      status |= float_loop::run(count, {a[I]...}, {y[O]...});
+      (narrow_block(y[O], out[O] + first, count), ...);
+    }
     return status;
   }
 };
 
 /// The same for functors on halves, in arrays of `Element`.
 template <typename Element, typename Body>
-block_loop<on_halves<Body, Element>, Element, Element, 1, 1> half_block_loop_by_base(
-    const half_v11<Body>*);
+half_block_loop<Body, Element, 1, 1> half_block_loop_by_base(const half_v11<Body>*);
 template <typename Element, typename Body>
-block_loop<on_halves<Body, Element>, Element, Element, 1, 2> half_block_loop_by_base(
-    const half_v12<Body>*);
+half_block_loop<Body, Element, 1, 2> half_block_loop_by_base(const half_v12<Body>*);
 template <typename Element, typename Body>
-block_loop<on_halves<Body, Element>, Element, Element, 2, 1> half_block_loop_by_base(
-    const half_v21<Body>*);
+half_block_loop<Body, Element, 2, 1> half_block_loop_by_base(const half_v21<Body>*);
 template <typename Element>
 void half_block_loop_by_base(...);
 
