@@ -5,12 +5,11 @@ from the results of bench_host_calls_<set> in host_calls_<set>.json files (Googl
 
 from __future__ import annotations
 
-import math
 import sys
 from collections import defaultdict
 from pathlib import Path
 
-from host_loop_page import TIERS, TYPES, Case, draw_bars, processor, times
+from host_loop_page import TIERS, TYPES, Case, draw_bars, mean, processor, times
 
 # What a tier is measured by: SLEEF's functions of 1 ulp, or of 3.5 ulp where it has them.
 REFERENCES = {"ha": ("sleef_u10",), "la": ("sleef_u10",), "ep": ("sleef_u35", "sleef_u10")}
@@ -51,7 +50,7 @@ def means(found: dict[Case, dict[str, float]]) -> str:
         cells = []
         for tier in TIERS:
             values = ratios[n, tier]
-            cells += [f"{math.exp(sum(map(math.log, values)) / len(values)):.2f}", f"{max(values):.2f}"]
+            cells += [f"{mean(values):.2f}", f"{max(values):.2f}"]
         lines.append(f"| {n} | " + " | ".join(cells) + " |")
     return "\n".join(lines) + "\n"
 

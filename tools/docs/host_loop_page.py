@@ -16,6 +16,10 @@ from pathlib import Path
 
 REFERENCE = "sleef_u10"
 TIERS = ("ha", "la", "ep")
+EXPONENTIALS_AND_LOGARITHMS = {
+    "exp", "exp2", "exp10", "expm1", "ln", "log2", "log10", "log1p",
+}
+REDUCED = ("_nolut", "_nofp64")
 PEERS = ("sleef_u35", "libmvec")
 TYPES = {"s": "float", "d": "double"}
 
@@ -25,7 +29,8 @@ Each body in the loop that host kernels are made of, on one thread, beside the v
 SLEEF and of the C library (libmvec) in the same run. SLEEF's functions of 1 ulp are the measure: their
 time stands in nanoseconds per element, all else is the ratio of times to theirs, below 1 if faster. A
 tier without a figure of its own has the body of the one on its left; a figure for a device without
-tables or without double stands behind a slash where that is another body. Times are the least of the
+tables or without double stands behind a slash where that is another body; means are over the bodies that host
+kernels run, in the last column over all. Times are the least of the
 repetitions. Written by `scripts/bench host_loop`.
 """
 
@@ -53,8 +58,13 @@ def times(path: Path, clock: str = "cpu_time") -> dict[Case, dict[str, float]]:
     return found
 
 
-def bodies(measured: dict[str, float], tier: str) -> list[float]:
-    return [time for name, time in measured.items() if name.startswith(tier + "_")]
+def bodies(measured: dict[str, float], tier: str, reduced: bool = True) -> list[float]:
+    """Those of a tier, with or without the ones made for devices without tables or double."""
+    return [
+        time
+        for name, time in measured.items()
+        if name.startswith(tier + "_") and (reduced or not name.endswith(REDUCED))
+    ]
 
 
 def ratio(time: float, measured: dict[str, float]) -> str:
@@ -77,23 +87,41 @@ def table(found: dict[Case, dict[str, float]], arguments: str) -> str:
     return "\n".join(lines) + "\n"
 
 
-def geometric_means(found: dict[Case, dict[str, float]]) -> str:
+def mean(values: list[float]) -> float:
+    return math.exp(sum(map(math.log, values)) / len(values))
+
+
+def ratios_by_tier(
+    found: dict[Case, dict[str, float]], reduced: bool
+) -> dict[tuple[int, str], list[float]]:
     ratios: dict[tuple[int, str], list[float]] = defaultdict(list)
     for case, measured in found.items():
         if case.arguments != "ordinary" or REFERENCE not in measured:
             continue
         inherited: list[float] = []
         for tier in TIERS:
-            inherited = bodies(measured, tier) or inherited
-            for time in inherited:
-                ratios[case.n, tier].append(time / measured[REFERENCE])
-    lines = ["| n | " + " | ".join(f"`{t}`" for t in TIERS) + " | all | largest |", "|" + "---|" * 6]
-    for n in sorted({n for n, _ in ratios}):
-        of_tiers = [ratios[n, tier] for tier in TIERS]
-        every = [value for values in of_tiers for value in values]
-        cells = [f"{math.exp(sum(map(math.log, v)) / len(v)):.2f}" for v in (*of_tiers, every)]
-        lines.append(f"| {n} | " + " | ".join(cells) + f" | {max(every):.2f} |")
+            inherited = bodies(measured, tier, reduced) or inherited
+            ratios[case.n, tier] += [time / measured[REFERENCE] for time in inherited]
+    return ratios
+
+
+def geometric_means(found: dict[Case, dict[str, float]]) -> str:
+    host, every = ratios_by_tier(found, False), ratios_by_tier(found, True)
+    lines = [
+        "| n | " + " | ".join(f"`{t}`" for t in TIERS) + " | all | largest | with reduced bodies |",
+        "|" + "---|" * 7,
+    ]
+    for n in sorted({n for n, _ in host}):
+        all_host = [value for tier in TIERS for value in host[n, tier]]
+        with_reduced = [value for tier in TIERS for value in every[n, tier]]
+        cells = [f"{mean(host[n, tier]):.2f}" for tier in TIERS]
+        cells += [f"{mean(all_host):.2f}", f"{max(all_host):.2f}", f"{mean(with_reduced):.2f}"]
+        lines.append(f"| {n} | " + " | ".join(cells) + " |")
     return "\n".join(lines) + "\n"
+
+
+def of_family(found: dict[Case, dict[str, float]], functions: set[str]) -> dict:
+    return {case: measured for case, measured in found.items() if case.function in functions}
 
 
 def draw_bars(rows: list[tuple[str, list[float]]], title: str, axis: str, path: Path) -> bool:
@@ -157,6 +185,8 @@ def main() -> None:
         name = path.stem
         text += f"\n## {name}\n\nGeometric means of the ratios, ordinary arguments:\n\n"
         text += geometric_means(found)
+        text += "\nThe same for exponentials and logarithms alone:\n\n"
+        text += geometric_means(of_family(found, EXPONENTIALS_AND_LOGARITHMS))
         picture = folder / f"host_loop_{name}.svg"
         if draw(found, f"{name}, n = 4096", picture):
             text += f"\n![Ratios of times]({picture.name})\n"
