@@ -146,7 +146,7 @@ struct cbrt_s : scalar_v11<cbrt_s<t>, float> {
   }
 };
 
-/// cbrt, double, status 0 at `la` and `ep`; within 0.72, 1.49, 2680 ulp for `ha`, `la`, `ep`:
+/// cbrt, double, status 0 at `la` and `ep`; within 0.74, 1.53, 2680 ulp for `ha`, `la`, `ep`:
 /// degree 20 with 2^(k/3) in two words, 18, 13.
 template <tier t>
 struct cbrt_d : scalar_v11<cbrt_d<t>, double> {

@@ -114,7 +114,7 @@ struct invcbrt_d_paths : scalar_v11<Body, double> {
 /// invcbrt, double. Code 2 for zeros; ±0 for ±infinity. Denormals are within 0.51 ulp.
 ///
 /// One row of (2^k·c)^(-1/3), and the series of (1 + g)^(-1/3) to degree 7, |g| <= 1/65. `la` and
-/// `ep`, one body: rows in one word; within 3.1 ulp, most of it by the end of the series.
+/// `ep`, one body: rows in one word; within 3.2 ulp, most of it by the end of the series.
 template <tier t>
 struct invcbrt_d : invcbrt_d_paths<invcbrt_d<t>> {
   LUMEN_MAIN double inverse_root(double x) {
@@ -127,7 +127,7 @@ struct invcbrt_d : invcbrt_d_paths<invcbrt_d<t>> {
   }
 };
 
-/// `ha`: rows in two words and degree 8; within 0.51 ulp.
+/// `ha`: rows in two words and degree 8; within 0.52 ulp.
 template <>
 struct invcbrt_d<tier::ha> : invcbrt_d_paths<invcbrt_d<tier::ha>> {
   LUMEN_MAIN double inverse_root(double x) {

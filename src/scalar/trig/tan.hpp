@@ -106,7 +106,7 @@ struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
 ///
 /// `la` and `ep`: x - n pi/2 with pi/2 in three and two parts, and r/D(r^2) or its negative
 /// reciprocal with D of degree 9 and 4; the quotient from the reciprocal at float by two steps of
-/// Newton's method. Largest error 2.8 and 5.2e7 ulp. The two parts leave 2^-86 of pi/2: closer than
+/// Newton's method. Largest error 3.1 and 5.2e7 ulp. The two parts leave 2^-86 of pi/2: closer than
 /// n 2^-59 to a multiple, `ep` has fewer than 26 bits. From 2^20 a reduction in fixed point and D
 /// of degree 10, with a division, within 2.2 ulp. The NaN of an infinity is the negative one, and a
 /// NaN loses its sign.
