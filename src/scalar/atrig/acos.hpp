@@ -49,7 +49,7 @@ struct acos_paths : scalar_v11<Body, T> {
   }
 };
 
-/// acos, float; largest error 0.68 ulp at `ha`, 3.2 in the one body of `la` and `ep`.
+/// acos, float; largest error 0.70 ulp at `ha`, 3.3 in the one body of `la` and `ep`.
 template <tier t>
 struct acos_s : acos_paths<acos_s<t>, float> {
   LUMEN_MAIN float angle(float x, const half_angle<float>& r) {
@@ -61,7 +61,7 @@ struct acos_s : acos_paths<acos_s<t>, float> {
   }
 };
 
-/// acos, double. The polynomial has degree 12, at `ep` 5. Largest error 0.72, 2.3 and 4.1e7 ulp
+/// acos, double. The polynomial has degree 12, at `ep` 5. Largest error 0.74, 2.4 and 4.1e7 ulp
 /// for `ha`, `la`, `ep`.
 template <tier t>
 struct acos_d : acos_paths<acos_d<t>, double> {

@@ -37,7 +37,7 @@ struct acospi_s : scalar_v11<acospi_s<t>, float> {
   }
 };
 
-/// acospi, double; largest error 0.67, 2.5 and 4.0e7 ulp for `ha`, `la`, `ep`. Code 1 for |x| > 1
+/// acospi, double; largest error 0.69, 2.6 and 4.1e7 ulp for `ha`, `la`, `ep`. Code 1 for |x| > 1
 /// and for every NaN.
 template <tier t>
 struct acospi_d : scalar_v11<acospi_d<t>, double> {
