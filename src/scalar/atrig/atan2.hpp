@@ -17,7 +17,8 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
 /// atan2, float: the angle of the point (x, y), status 0 for all points. With q the smaller
 /// magnitude over the larger it is arctan q, pi/2 - arctan q, pi - arctan q or pi/2 + arctan q by
-/// the octant. Largest error 0.96, 2.5 and 2.3e3 ulp for `ha`, `la`, `ep`.
+/// the octant. Largest error 0.96, 2.5 and 2.3e3 ulp for `ha`, `la`, `ep`; at `ha` 1.23 where the
+/// smaller magnitude is below 2^-102 and the error of the quotient underflows.
 ///
 /// The rare path serves a smaller magnitude of 0 and a larger one that is not from a range of
 /// ordinary numbers: it handles the specials, and scales what is finite into that range.
