@@ -3,6 +3,11 @@
 
 #include "scalar/atrig/atan2.hpp"
 
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <random>
+
 #include "atrig_cases.hpp"
 
 namespace {
@@ -127,10 +132,36 @@ TEST(Atan2Float, RangeOfTheMainPath) {
   EXPECT_FALSE(la(1, 0xfe800001));
   EXPECT_FALSE(la(0x3f800000, 0));
   EXPECT_FALSE(la(0x80000000, 0x3f800000));
-  EXPECT_TRUE(ha(0x20000000, 1));
-  EXPECT_FALSE(ha(0x1fffffff, 1));
-  EXPECT_TRUE(ha(0x7e800000, 1));
-  EXPECT_FALSE(ha(0x7e800001, 1));
+  EXPECT_TRUE(ha(0x0c800000, 0x0c800000));
+  EXPECT_FALSE(ha(0x20000000, 0x0c7fffff));
+  EXPECT_TRUE(ha(0x7e800000, 0x0c800000));
+  EXPECT_FALSE(ha(0x7e800001, 0x0c800000));
+}
+
+/// Where the error of an unscaled quotient would underflow.
+TEST(Atan2Float, SmallMagnitudes) {
+  const auto expect_within_one_ulp = [](std::uint32_t y_bits, std::uint32_t x_bits) {
+    const float y = element<float>::value(y_bits), x = element<float>::value(x_bits);
+    float r;
+    EXPECT_EQ(atan2_s<tier::ha>::call(&y, &x, &r), 0u);
+    const long double exact = std::atan2(static_cast<long double>(y), static_cast<long double>(x));
+    const int exponent = std::max(std::ilogb(exact) - 23, -149);
+    EXPECT_LE(std::fabs(static_cast<long double>(r) - exact), std::ldexp(1.0L, exponent))
+        << std::hex << y_bits << ", " << x_bits;
+  };
+  expect_within_one_ulp(0x80a6e058, 0x2aa81d20);
+  std::mt19937 engine(102);
+  for (int i = 0; i < 200'000; ++i) {
+    // One magnitude below 2^-100, the other one from there to 2^127, any signs, either order.
+    const std::uint32_t small = engine() % 0x0d800000u + 1;
+    const std::uint32_t large = small + engine() % (0x7f7fffffu - small);
+    const std::uint32_t signs = engine();
+    const std::uint32_t a = small | (signs & 0x80000000u), b = large | ((signs << 1) & 0x80000000u);
+    if (i % 4 == 0)
+      expect_within_one_ulp(b, a);
+    else
+      expect_within_one_ulp(a, b);
+  }
 }
 
 /// A zero beside any number stays on the main path of la, whose quotient is then 0.

@@ -17,17 +17,17 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
 /// atan2, float: the angle of the point (x, y), status 0 for all points. With q the smaller
 /// magnitude over the larger it is arctan q, pi/2 - arctan q, pi - arctan q or pi/2 + arctan q by
-/// the octant. Largest error 0.96, 2.5 and 2.3e3 ulp for `ha`, `la`, `ep`; at `ha` 1.23 where the
-/// smaller magnitude is below 2^-102 and the error of the quotient underflows.
+/// the octant. Largest error 0.98, 2.5 and 2.3e3 ulp for `ha`, `la`, `ep`.
 ///
-/// The rare path serves a smaller magnitude of 0 and a larger one that is not from a range of
+/// The rare path serves a smaller magnitude of 0 and magnitudes that are not from a range of
 /// ordinary numbers: it handles the specials, and scales what is finite into that range.
 template <tier t>
 struct atan2_s : scalar_v21<atan2_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float y, float x) {
     const auto p = quadrant<float>::of(y, x);
     const bool unscaled = bits(p.larger) - lowest <= highest - lowest;
-    return {value(bits(angle(p)) ^ sign_bit(y)), flag_if<float>(!unscaled, p.smaller == 0)};
+    return {value(bits(angle(p)) ^ sign_bit(y)),
+            flag_if<float>(!unscaled, bits(p.smaller) < smallest)};
   }
 
   LUMEN_RARE std::uint32_t rare(float y, float x, float* r) {
@@ -41,7 +41,7 @@ struct atan2_s : scalar_v21<atan2_s<t>, float> {
       const float diagonal = value(p.left != 0 ? 0x4016cbe4u : 0x3f490fdbu);  // 3·pi/4, pi/4
       *r = or_sign(is_infinite(p.smaller) ? diagonal : base, y);
     } else {
-      const float scale = value(bits(p.larger) > highest ? 0x1f800000u : 0x5f800000u);  // 2^∓64
+      const float scale = scale_for(p.larger);
       p.smaller *= scale;
       p.larger *= scale;
       *r = value(bits(angle(p)) ^ sign_bit(y));
@@ -50,9 +50,19 @@ struct atan2_s : scalar_v21<atan2_s<t>, float> {
   }
 
  private:
-  /// The larger magnitudes of the main path. At `ha` the error of the quotient must not underflow.
-  static constexpr std::uint32_t lowest = t == tier::ha ? 0x20000000u : 0x00800000u;
-  static constexpr std::uint32_t highest = 0x7e800000u;  // 2^126, its reciprocal is normal
+  /// The larger magnitudes of the main path: their reciprocals are normal.
+  static constexpr std::uint32_t lowest = 0x00800000u;
+  static constexpr std::uint32_t highest = 0x7e800000u;  // 2^126
+  /// The least of the smaller ones: at `ha` 2^-102, from which on the error of the quotient does
+  /// not underflow.
+  static constexpr std::uint32_t smallest = t == tier::ha ? 0x0c800000u : 1u;
+
+  /// What brings a point into the range: 2^-64, 2^64, or 1 where the larger magnitude is from
+  /// 2^62 to 2^126, beside which the smaller one of a point on the rare path counts as 0.
+  LUMEN_DEVICE static float scale_for(float larger) {
+    if (bits(larger) > highest) return value(0x1f800000u);
+    return value(bits(larger) <= 0x5e800000u ? 0x5f800000u : format<float>::one);
+  }
 
   LUMEN_MAIN float angle(const quadrant<float>& p) {
     const float base = p.base(pi_words<float>::half, pi_words<float>::whole);
