@@ -23,13 +23,6 @@ _COST = {
 _COST_OF_COMPLEX = 4.0
 _COST_OF_LIBRARY = 80.0
 
-_C_TYPES = {
-    "s": "float",
-    "d": "double",
-    "c": "_LUMEN_Complex8",
-    "z": "_LUMEN_Complex16",
-}
-
 
 @dataclass(frozen=True)
 class Kernel:
@@ -77,7 +70,7 @@ class Kernel:
         return f"{both}, {strided}"
 
     @property
-    def threader(self) -> str:
+    def threader(self) -> tuple[str, str]:
         """The forms of the threading layer that run it, without and with increments."""
         t, u = self.input_letter, self.output_letter
         forms = {
@@ -99,18 +92,18 @@ class Kernel:
             return _COST_OF_COMPLEX
         return _COST[self.function.family]["sd".index(self.letter)]
 
-    def type_of(self, parameter: Parameter, types: dict[str, str]) -> str:
+    def type_of(self, parameter: Parameter) -> str:
         if parameter.kind == "in":
-            return f"const {types[self.input_letter]}*"
+            return f"const {ELEMENT_TYPES[self.input_letter]}*"
         if parameter.kind == "constant":
-            return types[self.input_letter]
-        return f"{types[self.output_letter]}*"
+            return ELEMENT_TYPES[self.input_letter]
+        return f"{ELEMENT_TYPES[self.output_letter]}*"
 
-    def parameters(self, strided: bool, types: dict[str, str] = ELEMENT_TYPES) -> str:
+    def parameters(self, strided: bool) -> str:
         """The operands as a list of parameters."""
         text = ""
         for parameter in self.function.parameters:
-            text += f", {self.type_of(parameter, types)} {parameter.name}"
+            text += f", {self.type_of(parameter)} {parameter.name}"
             if strided and parameter.kind != "constant":
                 text += f", std::int64_t inc{parameter.name}"
         return text
