@@ -111,6 +111,10 @@ class block_loop {
   [[gnu::always_inline]] static inline std::uint32_t block(const T* __restrict a,
                                                            const T* __restrict b, U* __restrict y,
                                                            [[maybe_unused]] U* __restrict z) {
+    if constexpr (has_fma && Length == length && requires { Body::template block<Length>(a, y); }) {
+      if (Body::template block<Length>(a, y)) [[likely]]
+        return 0;
+    }
     [[maybe_unused]] constexpr int in_flight = Length == length ? interleave<Body>() : 1;
     flag flags = 0;
     LUMEN_BLOCK_LOOP

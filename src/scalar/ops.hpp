@@ -141,6 +141,14 @@ LUMEN_DEVICE inline float divide(float a, float b) { return a / b; }
 LUMEN_DEVICE inline double divide(double a, double b) { return a / b; }
 #endif
 
+/// Whether `fma` is an instruction of the processor compiled for. Where it is a function of the C
+/// library, what counts on its speed is left out.
+#if defined(__FMA__) || defined(__ARM_FEATURE_FMA)
+inline constexpr bool has_fma = true;
+#else
+inline constexpr bool has_fma = false;
+#endif
+
 template <typename T>
 LUMEN_DEVICE inline T mad(T a, T b, T c) {
   return fma(a, b, c);

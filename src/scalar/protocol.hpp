@@ -9,8 +9,10 @@
 /// `rare` always returns status 0. The split is what makes one source fast everywhere: on a GPU the
 /// rare path is a branch that lanes seldom take, on a CPU the compiler vectorises `main` by itself.
 /// A body whose rare path many arguments in a row may take adds `beyond`, which is for flagged
-/// arguments what `main` is for all: the same results as `rare` without a branch, or a flag. Only
-/// loops over arrays use it.
+/// arguments what `main` is for all: the same results as `rare` without a branch, or a flag. A body
+/// that a processor computes faster in another way, such as floats in doubles, adds `block` for a
+/// number of elements at once: the same results and status 0, or false, after which `main` computes
+/// them. Only loops over arrays use these two.
 ///
 /// The bases below turn the two parts into the call that kernels use: a static `call` that takes
 /// pointers to operands (constants by value) and to results, reads each operand once, writes every

@@ -10,6 +10,7 @@
 #include "scalar/trig/half_sine.hpp"
 #include "scalar/trig/half_turn.hpp"
 #include "scalar/trig/half_turn_sine.hpp"
+#include "scalar/trig/half_turn_sine_block.hpp"
 #include "scalar/trig/octants.hpp"
 #include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
@@ -56,6 +57,11 @@ struct cos_s<tier::ha> : scalar_v11<cos_s<tier::ha>, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_cosine(x, y); }
+
+  template <std::int64_t length>
+  static bool block(const float* x, float* y) {
+    return half_turn_sine_block::cosine<length>(x, y);
+  }
 };
 
 /// cos, double. Code 1 for infinities.

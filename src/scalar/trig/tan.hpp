@@ -14,6 +14,7 @@
 #include "scalar/trig/parity.hpp"
 #include "scalar/trig/quarter_turn.hpp"
 #include "scalar/trig/quarter_turn_kernels.hpp"
+#include "scalar/trig/quarter_turn_tangent_block.hpp"
 #include "scalar/trig/tangent_rows_s.hpp"
 #include "scalar/trig/turn_rows.hpp"
 
@@ -75,6 +76,11 @@ struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
     if (is_special(x)) return of_special(x, y);
     *y = of_place(fixed_turn_by_table(x), x);
     return mask(code::none);
+  }
+
+  template <std::int64_t length>
+  static bool block(const float* x, float* y) {
+    return quarter_turn_tangent_block::tangent<length>(x, y);
   }
 
  private:
