@@ -92,18 +92,19 @@ class block_loop {
       return Body::main(load(a + i), load(b + i));
   }
 
-  /// The rare path, where the body has one.
+  static constexpr bool has_rare = requires(T x, U* y) { Body::rare(x, y); }
+  || requires(T x, U* y) { Body::rare(x, y, y); }
+  || requires(T x, U* y) { Body::rare(x, x, y); };
+
   static std::uint32_t rare(const T* a, [[maybe_unused]] const T* b, U* y, [[maybe_unused]] U* z,
                             std::int64_t i) {
     const T x = load(a + i);
-    if constexpr (Inputs == 2) {
-      if constexpr (requires { Body::rare(x, x, y); }) return Body::rare(x, load(b + i), y + i);
-    } else if constexpr (Outputs == 2) {
-      if constexpr (requires { Body::rare(x, y, z); }) return Body::rare(x, y + i, z + i);
-    } else {
-      if constexpr (requires { Body::rare(x, y); }) return Body::rare(x, y + i);
-    }
-    return 0;
+    if constexpr (Inputs == 2)
+      return Body::rare(x, load(b + i), y + i);
+    else if constexpr (Outputs == 2)
+      return Body::rare(x, y + i, z + i);
+    else
+      return Body::rare(x, y + i);
   }
 
   /// `b` and `z` are null where there is one input, or one output.
@@ -128,9 +129,12 @@ class block_loop {
       }
       flags |= result.rare;
     }
-    if (flags != 0) [[unlikely]]
-      return repair(Length, a, b, y, z);
-    return 0;
+    if constexpr (has_rare) {
+      if (flags != 0) [[unlikely]]
+        return repair(Length, a, b, y, z);
+      return 0;
+    }
+    return static_cast<std::uint32_t>(flags);
   }
 
   /// As many blocks as there are from `first` on, which is advanced.

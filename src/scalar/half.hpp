@@ -109,8 +109,9 @@ struct half_v11 {
         store_half(y, r);
         return status;
       }
+      return 0;
     }
-    return 0;
+    return result.rare;
   }
 };
 
@@ -132,8 +133,9 @@ struct half_v12 {
         store_half(y2, second);
         return status;
       }
+      return 0;
     }
-    return 0;
+    return result.rare;
   }
 };
 
@@ -155,8 +157,9 @@ struct half_v21 {
         store_half(y, r);
         return status;
       }
+      return 0;
     }
-    return 0;
+    return result.rare;
   }
 };
 template <typename Body>

@@ -5,14 +5,14 @@
 ///
 /// A body is written in two parts. `main` is branch-free arithmetic computed for every element,
 /// arguments that it cannot serve included; beside the value it says whether the rare path holds.
-/// `rare` recomputes such an element from the beginning and assigns the status. A body without a
-/// `rare` always returns status 0. The split is what makes one source fast everywhere: on a GPU the
-/// rare path is a branch that lanes seldom take, on a CPU the compiler vectorises `main` by itself.
-/// A body whose rare path many arguments in a row may take adds `beyond`, which is for flagged
-/// arguments what `main` is for all: the same results as `rare` without a branch, or a flag. A body
-/// that a processor computes faster in another way, such as floats in doubles, adds `block` for a
-/// number of elements at once: the same results and status 0, or false, after which `main` computes
-/// them. Only loops over arrays use these two.
+/// `rare` recomputes such an element from the beginning and assigns the status. Without a `rare`
+/// the flag is the status mask itself, 0 where there is none. The split is what makes one source
+/// fast everywhere: on a GPU the rare path is a branch that lanes seldom take, on a CPU the
+/// compiler vectorises `main` by itself. A body whose rare path many arguments in a row may take
+/// adds `beyond`, which is for flagged arguments what `main` is for all: the same results as `rare`
+/// without a branch, or a flag. A body that a processor computes faster in another way, such as
+/// floats in doubles, adds `block` for a number of elements at once: the same results and status 0,
+/// or false, after which `main` computes them. Only loops over arrays use these two.
 ///
 /// The bases below turn the two parts into the call that kernels use: a static `call` that takes
 /// pointers to operands (constants by value) and to results, reads each operand once, writes every
@@ -62,7 +62,8 @@ LUMEN_DEVICE constexpr typename rare_flag<T>::type flag_if(Conditions... conditi
   return (static_cast<flag>(conditions) | ...);
 }
 
-/// The value of a main path, and whether the rare path holds instead (non-zero: it does).
+/// The value of a main path, and whether the rare path holds instead (non-zero: it does); without a
+/// rare path the status mask.
 template <typename U>
 struct main_result {
   U value;
@@ -108,8 +109,9 @@ struct scalar_v11 {
     if constexpr (requires { Body::rare(x, y); }) {
       if (result.rare) [[unlikely]]
         return Body::rare(x, y);
+      return 0;
     }
-    return 0;
+    return static_cast<std::uint32_t>(result.rare);
   }
 };
 
@@ -126,8 +128,9 @@ struct scalar_v12 {
     if constexpr (requires { Body::rare(x, y1, y2); }) {
       if (result.rare) [[unlikely]]
         return Body::rare(x, y1, y2);
+      return 0;
     }
-    return 0;
+    return static_cast<std::uint32_t>(result.rare);
   }
 };
 
@@ -144,8 +147,9 @@ struct scalar_v21 {
     if constexpr (requires { Body::rare(x, y, r); }) {
       if (result.rare) [[unlikely]]
         return Body::rare(x, y, r);
+      return 0;
     }
-    return 0;
+    return static_cast<std::uint32_t>(result.rare);
   }
 };
 
@@ -161,8 +165,9 @@ struct scalar_v21c {
     if constexpr (requires { Body::rare(x, c, r); }) {
       if (result.rare) [[unlikely]]
         return Body::rare(x, c, r);
+      return 0;
     }
-    return 0;
+    return static_cast<std::uint32_t>(result.rare);
   }
 };
 

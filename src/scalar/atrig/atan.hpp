@@ -155,11 +155,9 @@ struct atan_d<tier::ha> : scalar_v11<atan_d<tier::ha>, double> {
   static constexpr int interleave = 4;
 
   LUMEN_MAIN main_result<double> main(double x) {
-    const auto s = tangent_segment::of(fabs(x));
-    const double high = value(internal_datan_ha_data[s.row + 2]);
-    const double low = value(internal_datan_ha_data[s.row + 3]);
+    const auto s = tangent_segment::of(fabs(x), internal_datan_ha_data);
     const double z = s.t * s.t;
-    const double angle = high + (s.t + fma(arctangent_rest_of_segment(z), z * s.t, low));
+    const double angle = s.high + (s.t + fma(arctangent_rest_of_segment(z), z * s.t, s.low));
     return {value(bits(angle) ^ sign_bit(x)), flag_if<double>(is_extreme(x))};
   }
 

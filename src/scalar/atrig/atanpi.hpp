@@ -90,12 +90,10 @@ struct atanpi_d<tier::ep> : scalar_v11<atanpi_d<tier::ep>, double> {
 template <>
 struct atanpi_d<tier::ha> : scalar_v11<atanpi_d<tier::ha>, double> {
   LUMEN_MAIN main_result<double> main(double x) {
-    const auto s = tangent_segment::of(fabs(x));
+    const auto s = tangent_segment::of(fabs(x), internal_datanpi_ha_data);
     const double z = s.t * s.t;
     const double rest = arctangent_rest_of_segment(z) * (z * s.t);
-    const double y =
-        base_and_arctangent_over_pi(value(internal_datanpi_ha_data[s.row + 2]),
-                                    value(internal_datanpi_ha_data[s.row + 3]), s.t, rest);
+    const double y = base_and_arctangent_over_pi(s.high, s.low, s.t, rest);
     return {or_sign(y, x), flag_if<double>(!(fabs(x) >= 0x1p-900), is_extreme(x))};
   }
 

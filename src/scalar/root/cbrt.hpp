@@ -167,12 +167,8 @@ struct cbrt_d<tier::ha> : scalar_v11<cbrt_d<tier::ha>, double> {
     const double y = cube_root<double>::of<cbrt_polynomial_d<tier::ha>, true>(x);
     const bool from_one = y >= 1.0;
     const bool below_nine = y < 9.0;
-    return {y, flag_if<double>(from_one & below_nine)};
-  }
-
-  LUMEN_RARE std::uint32_t rare(double x, double* y) {
-    *y = main(x).value;
-    return (1u << static_cast<std::int32_t>(*y)) >> 1;
+    const double i = select(from_one & below_nine, y, 0.0);
+    return {y, (std::uint64_t{1} << static_cast<std::int32_t>(i)) >> 1};
   }
 };
 

@@ -40,11 +40,11 @@ struct fixed_turn_block {
   }
 
   /// The 31 bits of a rest that the fixed point keeps; the others are cut off, away from zero if
-  /// `up`. The bits of `mark` are flipped.
-  LUMEN_MAIN double cut(double rest, bool up, std::uint64_t mark) {
+  /// `up`.
+  LUMEN_MAIN double cut(double rest, bool up) {
     constexpr std::uint64_t behind = 0x3fffff;
     const std::uint64_t p = bits(rest) + select(up, behind, std::uint64_t{0});
-    return value((p & ~behind) ^ mark);
+    return value(p & ~behind);
   }
 
   LUMEN_MAIN bool differ_in_sign(double x, double y) {

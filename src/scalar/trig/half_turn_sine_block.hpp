@@ -20,7 +20,7 @@ struct half_turn_sine_block : private fixed_turn_block {
       const double a = x[i];
       const double shifted = fma(a, inverse_pi, shifter);
       const double r = rest(a, shifted - shifter);
-      t[i] = cut(r, differ_in_sign(r, a), bits(shifted) << 63);
+      t[i] = value(bits(cut(r, differ_in_sign(r, a))) ^ (bits(shifted) << 63));
       u[i] = static_cast<float>(t[i]);
     }
     std::uint32_t unserved = 0;
@@ -39,7 +39,7 @@ struct half_turn_sine_block : private fixed_turn_block {
       const double a = fabs(static_cast<double>(x[i]));
       const double shifted = fma(a, inverse_pi, -0.5) + shifter;
       const double r = rest_of_next_quarter(a, shifted - shifter);
-      t[i] = cut(r, r < 0, ~bits(shifted) << 63);
+      t[i] = value(bits(cut(r, r < 0)) ^ (~bits(shifted) << 63));
       u[i] = static_cast<float>(t[i]);
     }
     std::uint32_t unserved = 0;

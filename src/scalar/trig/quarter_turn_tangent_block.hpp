@@ -23,9 +23,10 @@ struct quarter_turn_tangent_block : private fixed_turn_block {
       const double shifter = 0x1.8p51;  // to halves: n/2 quarter turns of pi/2
       const double shifted = fma(a, inverse_pi, shifter);
       const double r = rest(a, shifted - shifter);
-      // The lowest bit of the rest, which is free, says whether n is odd.
-      t[i] = cut(r, differ_in_sign(r, a), bits(shifted) & 1);
-      p[i] = static_cast<float>(t[i]);
+      const double kept = cut(r, differ_in_sign(r, a));
+      p[i] = static_cast<float>(kept);
+      // The lowest bit says whether n is odd. Set before, it would decide ties.
+      t[i] = value(bits(kept) | (bits(shifted) & 1));
     }
     std::uint32_t out_of_range = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
