@@ -35,6 +35,8 @@ struct cos_s : scalar_v11<cos_s<t>, float> {
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_cosine(x, y); }
 
+  LUMEN_MAIN main_result<float> beyond(float x) { return half_turn_sine::finite_cosine(x); }
+
  private:
   LUMEN_MAIN float sine(float r) {
     const float z = r * r;
@@ -57,6 +59,8 @@ struct cos_s<tier::ha> : scalar_v11<cos_s<tier::ha>, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_cosine(x, y); }
+
+  LUMEN_MAIN main_result<float> beyond(float x) { return half_turn_sine::finite_cosine(x); }
 
   template <std::int64_t length>
   static bool block(const float* x, float* y) {

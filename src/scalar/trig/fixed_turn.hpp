@@ -33,11 +33,12 @@ LUMEN_MAIN std::uint64_t fixed_turn(float x) {
 }
 
 /// The same from 2^21 to the largest float, within 1, from those 128 digits of 1/(2 pi) that
-/// matter.
-LUMEN_DEVICE inline std::uint64_t fixed_turn_by_table(float x) {
+/// matter. Defined for all x.
+LUMEN_MAIN std::uint64_t fixed_turn_by_table(float x) {
   const auto e = static_cast<std::int32_t>((bits(x) >> 23) & 0xffu);
   const std::uint64_t m = (bits(x) & format<float>::fraction) | 0x00800000u;
-  const std::int32_t place = e - 150;  // of the lowest bit of x
+  // That of the lowest bit of x, not below the first word.
+  const std::int32_t place = select(e < 118, -32, e - 150);
   const std::uint32_t* words = __ssin_ha_invpi_tbl + ((place >> 5) + 1);
   const auto shift = static_cast<std::uint32_t>(place & 31);
   const std::uint64_t low = words[2] * m + ((words[3] * m) >> 32);

@@ -20,19 +20,31 @@ struct half_turn_sine {
 
   LUMEN_DEVICE static std::uint32_t any_sine(float x, float* y) {
     if (is_special(x)) return of_special(x, y);
-    const std::uint64_t place = is_above_fixed_turn(x) ? fixed_turn_by_table(x) : fixed_turn(x);
-    *y = is_below_fixed_turn(x) ? x : of_place(place, sign_bit(x));
+    *y = finite_sine(x).value;
     return mask(code::none);
   }
   LUMEN_DEVICE static std::uint32_t any_cosine(float x, float* y) {
     if (is_special(x)) return of_special(x, y);
-    const std::uint64_t place = is_above_fixed_turn(x) ? fixed_turn_by_table(x) : fixed_turn(x);
-    *y = is_below_fixed_turn(x) ? 1.0f : of_place(place + quarter, 0);
+    *y = finite_cosine(x).value;
     return mask(code::none);
+  }
+
+  /// Without a branch, flagged unless x is finite.
+  LUMEN_MAIN main_result<float> finite_sine(float x) {
+    const float y = of_place(any_place(x), sign_bit(x));
+    return {select(is_below_fixed_turn(x), x, y), flag_if<float>(is_special(x))};
+  }
+  LUMEN_MAIN main_result<float> finite_cosine(float x) {
+    const float y = of_place(any_place(x) + quarter, 0);
+    return {select(is_below_fixed_turn(x), 1.0f, y), flag_if<float>(is_special(x))};
   }
 
  private:
   static constexpr std::uint64_t quarter = 0x4000000000000000;
+
+  LUMEN_MAIN std::uint64_t any_place(float x) {
+    return select(is_above_fixed_turn(x), fixed_turn_by_table(x), fixed_turn(x));
+  }
 
   LUMEN_MAIN float of_place(std::uint64_t place, std::uint32_t sign) {
     const auto half_turns = static_cast<std::uint32_t>(place >> 32) + 0x40000000u;

@@ -34,6 +34,8 @@ struct sin_s : scalar_v11<sin_s<t>, float> {
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_sine(x, y); }
 
+  LUMEN_MAIN main_result<float> beyond(float x) { return half_turn_sine::finite_sine(x); }
+
  private:
   LUMEN_MAIN float sine(float r) {
     const float z = r * r;
@@ -56,6 +58,8 @@ struct sin_s<tier::ha> : scalar_v11<sin_s<tier::ha>, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) { return half_turn_sine::any_sine(x, y); }
+
+  LUMEN_MAIN main_result<float> beyond(float x) { return half_turn_sine::finite_sine(x); }
 
   template <std::int64_t length>
   static bool block(const float* x, float* y) {

@@ -74,8 +74,12 @@ struct tan_s<tier::ha> : scalar_v11<tan_s<tier::ha>, float> {
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) {
     if (is_special(x)) return of_special(x, y);
-    *y = of_place(fixed_turn_by_table(x), x);
+    *y = beyond(x).value;
     return mask(code::none);
+  }
+
+  LUMEN_MAIN main_result<float> beyond(float x) {
+    return {of_place(fixed_turn_by_table(x), x), flag_if<float>(is_special(x))};
   }
 
   template <std::int64_t length>
