@@ -4,52 +4,112 @@
 
 #include <cstring>
 #include <mutex>
+#include <new>
 #include <utility>
 
 #include "scheduler.hpp"
 
 namespace sycl::detail {
 
-buffer_storage::buffer_storage(const buffer_description& description,
-                               std::unique_ptr<buffer_memory> memory,
+namespace {
+
+/// Where the default allocator puts what it allocates.
+constexpr std::align_val_t cache_line{64};
+
+[[noreturn]] void throw_no_memory() {
+  throw exception(errc::memory_allocation, "there is no memory for the buffer");
+}
+
+std::size_t bytes_of(const buffer_description& description) {
+  std::size_t bytes = 0;
+  if (__builtin_mul_overflow(description.elements, description.element_size, &bytes)) {
+    throw_no_memory();
+  }
+  return bytes;
+}
+
+}  // namespace
+
+buffer_storage::buffer_storage(buffer_description described, std::unique_ptr<buffer_memory> memory,
                                const property_list& buffer_properties)
     : properties(buffer_properties),
-      elements_(description.elements),
-      element_size_(description.element_size),
+      description_(std::move(described)),
       memory_(std::move(memory)),
-      data_(const_cast<void*>(description.initial)),
+      data_(const_cast<void*>(description_.initial)),
       in_place_(
-          description.initial != nullptr &&
+          description_.initial != nullptr &&
           (properties.has_property<property::buffer::use_host_ptr>() ||
-           (description.in_place && !properties.has_property<property::buffer::use_mutex>()))) {
+           (description_.in_place && !properties.has_property<property::buffer::use_mutex>()))),
+      write_back_(description_.write_back),
+      whole_(region{this, 0, bytes_of(description_)}) {
   if (in_place_) return;
   allocate();
-  if (description.initial != nullptr && elements_ != 0) {
-    std::unique_lock<std::mutex> lock;
-    if (properties.has_property<property::buffer::use_mutex>()) {
-      lock =
-          std::unique_lock(*properties.get_property<property::buffer::use_mutex>().get_mutex_ptr());
-    }
-    std::memcpy(data_, description.initial, elements_ * element_size_);
+  if (description_.initial != nullptr && bytes() != 0) {
+    const auto lock = callers_lock();
+    std::memcpy(data_, description_.initial, bytes());
   }
 }
 
 buffer_storage::~buffer_storage() {
-  if (!in_place_ && !is_small_ && data_ != nullptr) memory_->release(data_, elements_);
+  if (in_place_ || is_small_ || data_ == nullptr) return;
+  if (memory_ != nullptr) {
+    memory_->release(data_, description_.elements);
+  } else {
+    ::operator delete(data_, cache_line);
+  }
+}
+
+view_handle buffer_storage::make(buffer_description description,
+                                 std::unique_ptr<buffer_memory> memory,
+                                 const property_list& properties) {
+  auto made =
+      std::make_shared<buffer_storage>(std::move(description), std::move(memory), properties);
+  buffer_storage& storage = *made;
+  storage.self_ = std::move(made);
+  return view_handle(&storage.whole_);
+}
+
+void buffer_storage::close() {
+  const std::shared_ptr<buffer_storage> keep = std::move(self_);
+  const bool to_caller = write_back_ && !redirected_ && modified_ && !in_place_;
+  const bool to_destination = write_back_ && destination_ != nullptr;
+  if (to_caller || to_destination || in_place_) wait_for_accesses(0, bytes());
+  if (to_caller || to_destination) {
+    const auto lock = callers_lock();
+    if (to_destination) {
+      destination_->write(data_, description_.elements);
+    } else if (bytes() != 0) {
+      std::memcpy(const_cast<void*>(description_.initial), data_, bytes());
+    }
+  }
+  destination_ = nullptr;
+  description_.keep_alive = nullptr;
+}
+
+void buffer_storage::set_final_data(std::unique_ptr<final_destination> destination) {
+  destination_ = std::move(destination);
+  redirected_ = true;
+  write_back_ = true;
+}
+
+std::unique_lock<std::mutex> buffer_storage::callers_lock() const {
+  if (!properties.has_property<property::buffer::use_mutex>()) return {};
+  return std::unique_lock(*properties.get_property<property::buffer::use_mutex>().get_mutex_ptr());
 }
 
 void buffer_storage::allocate() {
   data_ = nullptr;
-  if (elements_ != 0 && elements_ * element_size_ <= small && memory_->is_default()) {
+  if (bytes() != 0 && bytes() <= small && memory_ == nullptr) {
     std::size_t space = sizeof small_;
     data_ = small_;
-    data_ = std::align(small, elements_ * element_size_, data_, space);
+    data_ = std::align(small, bytes(), data_, space);
     is_small_ = true;
-  } else if (elements_ != 0) {
+  } else if (description_.elements != 0) {
     try {
-      data_ = memory_->allocate(elements_);
+      data_ = memory_ != nullptr ? memory_->allocate(description_.elements)
+                                 : ::operator new(bytes(), cache_line);
     } catch (const std::bad_alloc&) {
-      throw exception(errc::memory_allocation, "there is no memory for the buffer");
+      throw_no_memory();
     }
   }
   in_place_ = false;
@@ -59,7 +119,7 @@ void buffer_storage::leave_callers_memory() {
   if (!in_place_ || accessed_ || properties.has_property<property::buffer::use_host_ptr>()) return;
   const void* const initial = data_;
   allocate();
-  if (elements_ != 0) std::memcpy(data_, initial, elements_ * element_size_);
+  if (bytes() != 0) std::memcpy(data_, initial, bytes());
 }
 
 spin_mutex& buffer_storage::accesses_mutex() noexcept {

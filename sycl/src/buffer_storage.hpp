@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <memory>
+#include <mutex>
 
 #include "command.hpp"
 #include "spin_mutex.hpp"
@@ -11,13 +12,29 @@
 
 namespace sycl::detail {
 
-/// The memory of a buffer and the accesses to it that are not complete.
-class buffer_storage : public std::enable_shared_from_this<buffer_storage> {
+/// What all views of a buffer share: its memory, the accesses to it that are not complete, and what
+/// becomes of the contents. It lives until the last view is gone and the last command that uses it
+/// is complete; until then the view of the whole buffer owns it.
+class buffer_storage {
  public:
-  buffer_storage(const buffer_description& description, std::unique_ptr<buffer_memory> memory,
+  buffer_storage(buffer_description description, std::unique_ptr<buffer_memory> memory,
                  const property_list& properties);
   ~buffer_storage();
+  buffer_storage(const buffer_storage&) = delete;
   buffer_storage& operator=(const buffer_storage&) = delete;
+
+  static view_handle make(buffer_description description, std::unique_ptr<buffer_memory> memory,
+                          const property_list& properties);
+  /// For a command. The buffer must be alive.
+  const std::shared_ptr<buffer_storage>& self() const noexcept { return self_; }
+
+  /// The contents go where they belong. Memory of the buffer's own that goes nowhere is left to
+  /// the commands that still use it.
+  void close();
+  void set_final_data(std::unique_ptr<final_destination> destination);
+  /// The contents do not go to the caller's memory any more.
+  void redirect() noexcept { redirected_ = true; }
+  void set_write_back(bool enabled) noexcept { write_back_ = enabled; }
 
   /// Guards the lists of accesses of all storages.
   static spin_mutex& accesses_mutex() noexcept;
@@ -30,9 +47,7 @@ class buffer_storage : public std::enable_shared_from_this<buffer_storage> {
   void leave_callers_memory();
 
   void* data() const noexcept { return data_; }
-  bool in_place() const noexcept { return in_place_; }
-  std::size_t elements() const noexcept { return elements_; }
-  std::size_t element_size() const noexcept { return element_size_; }
+  std::size_t element_size() const noexcept { return description_.element_size; }
 
   const property_list properties;
 
@@ -41,25 +56,31 @@ class buffer_storage : public std::enable_shared_from_this<buffer_storage> {
     if (!accessed_.load(std::memory_order_relaxed)) accessed_ = true;
     if (write && !modified_.load(std::memory_order_relaxed)) modified_ = true;
   }
-  bool modified() const noexcept { return modified_; }
 
  private:
+  std::size_t bytes() const noexcept { return whole_.size(); }
   void allocate();
+  /// Keeps the mutex of property::buffer::use_mutex, if there is one.
+  std::unique_lock<std::mutex> callers_lock() const;
 
   /// Room for a buffer of a few elements, which then costs no allocation, aligned like any other.
   static constexpr std::size_t small = 64;
   alignas(std::max_align_t) std::byte small_[2 * small];
   bool is_small_ = false;
 
-  std::size_t elements_;
-  std::size_t element_size_;
+  buffer_description description_;
   std::unique_ptr<buffer_memory> memory_;
   void* data_;
   bool in_place_;
+  bool redirected_ = false;
+  bool write_back_;
+  std::unique_ptr<final_destination> destination_;
   std::atomic<bool> accessed_{false};
   std::atomic<bool> modified_{false};
   access_record* first_ = nullptr;
   access_record* last_ = nullptr;
+  buffer_view whole_;
+  std::shared_ptr<buffer_storage> self_;
 };
 
 }  // namespace sycl::detail

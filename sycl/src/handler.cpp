@@ -140,7 +140,7 @@ void require_region(handler& cgh, const region& bytes, access_mode mode) {
   }
   const bool write = mode != access_mode::read;
   storage.note_access(write);
-  cgh.command_->add_access(storage.shared_from_this(), bytes.begin, bytes.end, write);
+  cgh.command_->add_access(storage.self(), bytes.begin, bytes.end, write);
 }
 
 }  // namespace detail

@@ -58,13 +58,20 @@ class allocator_memory final : public buffer_memory {
   void release(void* memory, std::size_t elements) noexcept override {
     std::allocator_traits<AllocatorT>::deallocate(allocator_, static_cast<T*>(memory), elements);
   }
-  bool is_default() const noexcept override {
-    return alignof(T) <= 64 && std::is_same_v<AllocatorT, aligned_allocator<T>>;
-  }
 
  private:
   AllocatorT allocator_;
 };
+
+/// Null for the default allocator.
+template <typename T, typename AllocatorT>
+std::unique_ptr<buffer_memory> memory_of(const AllocatorT& allocator) {
+  if constexpr (alignof(T) <= 64 && std::is_same_v<AllocatorT, aligned_allocator<T>>) {
+    return nullptr;
+  } else {
+    return std::make_unique<allocator_memory<T, AllocatorT>>(allocator);
+  }
+}
 
 template <typename T, typename Destination>
 class iterator_destination final : public final_destination {
@@ -244,8 +251,7 @@ class buffer {
     if (extents.size() * sizeof(ReinterpretT) != byte_size()) {
       detail::throw_error(errc::invalid, "a reinterpreted buffer must have as many bytes");
     }
-    return result(std::make_shared<detail::buffer_view>(*view_), extents,
-                  typename result::allocator_type(allocator_));
+    return result(view_->reinterpretation(), extents, typename result::allocator_type(allocator_));
   }
   template <typename ReinterpretT, int ReinterpretDim = Dimensions>
   requires(ReinterpretDim == 1 || (ReinterpretDim == Dimensions &&
@@ -293,23 +299,18 @@ class buffer {
         typename std::allocator_traits<AllocatorT>::template rebind_alloc<plain>;
     description.elements = extents.size();
     description.element_size = sizeof(T);
-    view_ = std::make_shared<detail::buffer_view>(
-        std::move(description),
-        std::make_unique<detail::allocator_memory<plain, plain_allocator>>(
-            plain_allocator(allocator_)),
-        properties);
+    view_ = detail::buffer_view::make(
+        std::move(description), detail::memory_of<plain>(plain_allocator(allocator_)), properties);
   }
   buffer(const std::vector<element>& contents, AllocatorT allocator,
          const property_list& properties)
       : buffer(range<1>(contents.size()), std::move(allocator), properties,
                {.initial = contents.data(), .keep_alive = {}}) {}
-  buffer(std::shared_ptr<detail::buffer_view> view, const range<Dimensions>& extents,
-         AllocatorT allocator)
+  buffer(detail::view_handle view, const range<Dimensions>& extents, AllocatorT allocator)
       : view_(std::move(view)), range_(extents), allocator_(std::move(allocator)) {}
 
-  static std::shared_ptr<detail::buffer_view> sub_view(const buffer& parent,
-                                                       const id<Dimensions>& base_index,
-                                                       const range<Dimensions>& extents) {
+  static detail::view_handle sub_view(const buffer& parent, const id<Dimensions>& base_index,
+                                      const range<Dimensions>& extents) {
     if (parent.is_sub_buffer()) {
       detail::throw_error(errc::invalid, "a sub-buffer cannot be made of a sub-buffer");
     }
@@ -325,11 +326,10 @@ class buffer {
       inner_whole = inner_whole && extents[d] == whole[d];
     }
     for (int d = 0; d < Dimensions; ++d) first = first * whole[d] + base_index[d];
-    return std::make_shared<detail::buffer_view>(*parent.view_, first * sizeof(T),
-                                                 extents.size() * sizeof(T));
+    return parent.view_->part(first * sizeof(T), extents.size() * sizeof(T));
   }
 
-  std::shared_ptr<detail::buffer_view> view_;
+  detail::view_handle view_;
   range<Dimensions> range_;
   AllocatorT allocator_{};
 };

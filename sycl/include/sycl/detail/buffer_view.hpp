@@ -2,8 +2,10 @@
 // SPDX-License-Identifier: Apache-2.0
 #pragma once
 
+#include <atomic>
 #include <cstddef>
 #include <memory>
+#include <utility>
 
 #include "../property.hpp"
 #include "export.hpp"
@@ -11,14 +13,12 @@
 
 namespace sycl::detail {
 
-/// Where a buffer's own memory comes from.
+/// Where a buffer's own memory comes from if the allocator is not the default one.
 class ARBOR_LUMEN_SYCL_API buffer_memory {
  public:
   virtual ~buffer_memory();
   virtual void* allocate(std::size_t elements) = 0;
   virtual void release(void* memory, std::size_t elements) noexcept = 0;
-  /// Whether it is the default allocator's, so that nobody sees when none is asked for.
-  virtual bool is_default() const noexcept = 0;
 };
 
 /// Where a buffer's contents go in the end.
@@ -41,19 +41,46 @@ struct buffer_description {
   std::shared_ptr<const void> keep_alive;
 };
 
-class buffer_core;
+class buffer_view;
 
-/// A buffer, a sub-buffer or a reinterpretation: a region of a storage that they share.
+/// Shares a view, which ends with its last handle.
+class view_handle {
+ public:
+  view_handle() noexcept = default;
+  /// Takes over the handle that a new view counts.
+  explicit view_handle(buffer_view* counted) noexcept : view_(counted) {}
+  view_handle(const view_handle& other) noexcept;
+  view_handle(view_handle&& other) noexcept : view_(std::exchange(other.view_, nullptr)) {}
+  view_handle& operator=(view_handle other) noexcept {
+    std::swap(view_, other.view_);
+    return *this;
+  }
+  ~view_handle();
+
+  buffer_view* get() const noexcept { return view_; }
+  buffer_view* operator->() const noexcept { return view_; }
+  buffer_view& operator*() const noexcept { return *view_; }
+
+  friend bool operator==(const view_handle& a, const view_handle& b) noexcept = default;
+
+ private:
+  buffer_view* view_ = nullptr;
+};
+
+/// A buffer, a sub-buffer or a reinterpretation: a region of a storage that they share. That of the
+/// whole buffer is a member of the storage and outlives its parts; these are objects by themselves.
 class ARBOR_LUMEN_SYCL_API buffer_view {
  public:
-  buffer_view(buffer_description description, std::unique_ptr<buffer_memory> memory,
-              const property_list& properties);
-  /// A part of `parent`, which starts `offset` bytes into it.
-  buffer_view(const buffer_view& parent, std::size_t offset, std::size_t bytes);
-  /// All of `parent`, as elements of another type.
-  explicit buffer_view(const buffer_view& parent);
-  ~buffer_view();
+  buffer_view(const buffer_view&) = delete;
   buffer_view& operator=(const buffer_view&) = delete;
+
+  /// A null `memory` stands for the default allocator's.
+  static view_handle make(buffer_description description, std::unique_ptr<buffer_memory> memory,
+                          const property_list& properties);
+  /// A part of this view, which starts `offset` bytes into it.
+  view_handle part(std::size_t offset, std::size_t bytes);
+  /// All of this view, as elements of another type.
+  view_handle reinterpretation();
 
   bool is_sub_buffer() const noexcept { return sub_buffer_; }
   const region& bytes() const noexcept { return region_; }
@@ -63,13 +90,40 @@ class ARBOR_LUMEN_SYCL_API buffer_view {
   void set_write_back(bool enabled);
 
  private:
-  std::shared_ptr<buffer_core> core_;
+  friend class view_handle;
+  friend class buffer_storage;
+
+  /// Of a whole buffer.
+  explicit buffer_view(const region& whole) noexcept : region_(whole) {}
+  buffer_view(view_handle whole, const region& bytes, bool sub_buffer) noexcept
+      : region_(bytes), whole_(std::move(whole)), sub_buffer_(sub_buffer) {}
+  ~buffer_view() = default;
+
+  view_handle whole();
+  /// The last handle is gone.
+  void end();
+
   region region_;
+  std::atomic<std::size_t> handles_{1};
+  /// The view of the whole buffer; null for that view itself.
+  view_handle whole_;
   bool sub_buffer_ = false;
-  /// Of this view alone; that of the whole buffer is in the core.
+  /// Of a part alone; that of the whole buffer is in the storage.
   std::unique_ptr<final_destination> destination_;
   std::size_t element_size_ = 1;
   bool write_back_ = true;
 };
+
+inline view_handle::view_handle(const view_handle& other) noexcept : view_(other.view_) {
+  if (view_ != nullptr) view_->handles_.fetch_add(1, std::memory_order_relaxed);
+}
+
+inline view_handle::~view_handle() {
+  // Nobody can copy the only handle meanwhile, so it needs no counting down.
+  if (view_ != nullptr && (view_->handles_.load(std::memory_order_acquire) == 1 ||
+                           view_->handles_.fetch_sub(1, std::memory_order_acq_rel) == 1)) {
+    view_->end();
+  }
+}
 
 }  // namespace sycl::detail
