@@ -100,7 +100,8 @@ std::vector<std::shared_ptr<platform_impl>>* make_platforms() {
       owner = std::make_shared<platform_impl>(each.from, vendor, vendor_text(each));
       platforms->push_back(owner);
     }
-    owner->devices.push_back(std::make_shared<device_impl>(each, owner.get()));
+    // Devices live as long as the process, so their handles count nothing.
+    owner->devices.emplace_back(std::shared_ptr<void>(), new device_impl(each, owner.get()));
   }
   return platforms.release();
 }
