@@ -34,7 +34,7 @@ BENCHMARK(queue_key)->Name("dispatch/queue key");
 
 void device_word(benchmark::State& state) {
   sycl::queue queue(bench::first_gpu());
-  for (auto _ : state) benchmark::DoNotOptimize(detail::device_word::of_queue(queue));
+  for (auto _ : state) benchmark::DoNotOptimize(detail::device_word::of_queue(&queue));
 }
 BENCHMARK(device_word)->Name("dispatch/device word");
 

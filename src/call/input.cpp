@@ -5,13 +5,15 @@
 
 #include <algorithm>
 #include <stdexcept>
+#include <string>
 
 #include "arbor/lumen/exception.hpp"
 
 namespace arbor::lumen::vm::detail::input {
 
-void throw_logic_error(const std::string& name, const char* message) {
-  throw std::logic_error("ArborLumen::vm::detail::input::" + name + ": " + message);
+void throw_logic_error(std::string_view name, const char* message) {
+  throw std::logic_error(
+      std::string("ArborLumen::vm::detail::input::").append(name).append(": ").append(message));
 }
 
 vxx::~vxx() = default;

@@ -3,15 +3,18 @@
 
 #pragma once
 
+#include <algorithm>
 #include <complex>
 #include <cstddef>
 #include <cstdint>
-#include <string>
+#include <string_view>
 #include <sycl/sycl.hpp>
 #include <vector>
 
 #include "arbor/lumen/slice.hpp"
 #include "arbor/lumen/vm/error_handler.hpp"
+#include "call/operand_list.hpp"
+#include "call/queue_key.hpp"
 #include "call/shape.hpp"
 
 /// The argument record of one call: built on the caller's stack by the exported function, read by
@@ -42,19 +45,13 @@ inline constexpr std::uint64_t precision_of_pair =
 template <typename T>
 class error_handler_x final : public error_handler<T> {
  public:
-  /// Stands for no handler until one is assigned: its buffer is not its own, which spares a call
-  /// that is still being built the making of one.
-  error_handler_x() : error_handler<T>(none()) {}
+  /// Does nothing. Kernels on buffers write to the handler's buffer also where it reports nothing,
+  /// so that every call needs one of its own.
+  error_handler_x() = default;
   explicit error_handler_x(const error_handler<T>& handler) : error_handler<T>(handler) {}
   error_handler_x& operator=(const error_handler<T>& handler) {
     error_handler<T>::operator=(handler);
     return *this;
-  }
-
- private:
-  static const error_handler<T>& none() {
-    static const error_handler<T> handler;
-    return handler;
   }
 };
 
@@ -80,15 +77,15 @@ class vxx {
 
   bool has_slices() const { return !in_slices.empty() || !out_slices.empty(); }
 
-  std::string name;              ///< the public function's name, for messages
-  sycl::queue* queue = nullptr;  ///< the caller's queue
-  std::int64_t n = 0;            ///< element count; 0 where the form has none
-  std::uint32_t mode = 0;        ///< the merged mode word
+  std::string_view name;   ///< the public function's name, for messages
+  keyed_queue queue;       ///< the caller's queue
+  std::int64_t n = 0;      ///< element count; 0 where the form has none
+  std::uint32_t mode = 0;  ///< the merged mode word
   std::vector<sycl::event> depends;
-  std::vector<slice> in_slices;
-  std::vector<slice> out_slices;
-  std::vector<std::int64_t> in_lengths;   ///< of spans and buffers
-  std::vector<std::int64_t> out_lengths;  ///< of spans and buffers
+  operand_list<slice> in_slices;
+  operand_list<slice> out_slices;
+  operand_list<std::int64_t> in_lengths;   ///< of spans and buffers
+  operand_list<std::int64_t> out_lengths;  ///< of spans and buffers
 
  protected:
   [[noreturn]] void reject_index(const char* message) const;
@@ -99,12 +96,16 @@ class vxx {
 
 /// Throws `std::logic_error` for the function `name`: a defect of the library or of its caller that
 /// no mode makes quiet.
-[[noreturn]] void throw_logic_error(const std::string& name, const char* message);
+[[noreturn]] void throw_logic_error(std::string_view name, const char* message);
 
 /// The arguments of a call with inputs of `T` and outputs of `U`.
 template <typename T, typename U>
 class typed_vxx : public vxx {
  public:
+  typed_vxx() = default;
+  /// The handler is copied.
+  explicit typed_vxx(const error_handler<U>& callers) : handler(callers) {}
+
   bool check(bool throw_on_error) const override;
   std::uint64_t precision() const override { return precision_of_pair<T, U>; }
 
@@ -122,16 +123,16 @@ class typed_vxx : public vxx {
   }
   T constant(std::size_t i) const { return at(constants, i, "index of constant is too large"); }
 
-  std::vector<sycl::buffer<T, 1>*> in_buffers;
-  std::vector<const T*> in_pointers;
-  std::vector<T> constants;
-  std::vector<sycl::buffer<U, 1>*> out_buffers;
-  std::vector<U*> out_pointers;
+  operand_list<sycl::buffer<T, 1>*> in_buffers;
+  operand_list<const T*> in_pointers;
+  operand_list<T> constants;
+  operand_list<sycl::buffer<U, 1>*> out_buffers;
+  operand_list<U*> out_pointers;
   error_handler_x<U> handler;
 
  private:
   template <typename V>
-  V at(const std::vector<V>& values, std::size_t i, const char* message) const {
+  V at(const operand_list<V>& values, std::size_t i, const char* message) const {
     if (i >= values.size()) reject_index(message);
     return values[i];
   }
@@ -141,7 +142,13 @@ class typed_vxx : public vxx {
 enum class form { usm_linear, usm_strided, buffer_linear, buffer_strided };
 
 template <form Form, typename Shape, typename T, typename U>
-class record final : public typed_vxx<T, U> {};
+class record final : public typed_vxx<T, U> {
+  static_assert(std::max({Shape::inputs, Shape::constants, Shape::outputs}) <=
+                static_cast<int>(operand_list<T>::capacity));
+
+ public:
+  using typed_vxx<T, U>::typed_vxx;
+};
 
 namespace usm {
 template <typename Shape, typename T, typename U>

@@ -26,21 +26,16 @@ inline constexpr std::uint32_t deciding_bits[] = {0xB, 0x100, 0x6000, 0x20000, 0
 
 /// `base` with each group that `word` names taken from `word`.
 constexpr std::uint32_t merge(std::uint32_t base, std::uint32_t word) {
-  for (const std::uint32_t group : groups) {
-    if ((word & group) != 0 && (word & group) != (base & group))
-      base = (base & ~group) | (word & group);
-  }
-  return base;
+  std::uint32_t named = 0;
+  for (const std::uint32_t group : groups) named |= (word & group) != 0 ? group : 0;
+  return (base & ~named) | (word & named);
 }
 
 /// The mode in force where `stored` is the word of the queue, 0 if it has none.
 constexpr std::uint32_t in_force(std::uint32_t stored) {
-  std::uint32_t word = 0;
-  for (int i = 0; i < 6; ++i) {
-    const std::uint32_t from = (stored & deciding_bits[i]) != 0 ? stored : enums::default_mode;
-    word |= from & groups[i];
-  }
-  return word;
+  std::uint32_t named = 0;
+  for (int i = 0; i < 6; ++i) named |= (stored & deciding_bits[i]) != 0 ? groups[i] : 0;
+  return (enums::default_mode & ~named) | (stored & named);
 }
 
 }  // namespace arbor::lumen::vm::detail::mode_word

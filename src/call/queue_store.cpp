@@ -4,33 +4,10 @@
 #include "call/queue_store.hpp"
 
 #include <cstdlib>
-#include <cstring>
-#include <functional>
 
 #include "call/mode_word.hpp"
 
 namespace arbor::lumen::vm::detail {
-namespace {
-
-/// What a SYCL handle is a handle of: its first machine word, the implementation pointer.
-template <typename Handle>
-std::uint64_t identity(const Handle& handle) {
-  static_assert(sizeof(Handle) >= sizeof(std::uint64_t));
-  std::uint64_t word;
-  std::memcpy(&word, static_cast<const void*>(&handle), sizeof word);
-  return word;
-}
-
-}  // namespace
-
-std::uint64_t queue_key(const sycl::queue* queue) {
-  if (queue == nullptr) return 0;
-  const sycl::context context = queue->get_context();
-  const sycl::device device = queue->get_device();
-  return 0x428a2f98d728ae22 * static_cast<std::uint64_t>(std::hash<sycl::queue>{}(*queue)) ^
-         0x2427114e873b90dd * fnv(identity(context)) ^ 0x504f4fa00fc9fb57 * fnv(identity(device));
-}
-
 queue_store& queue_store::instance() {
   static queue_store store;
   store.read_verbosity();
@@ -46,9 +23,8 @@ void queue_store::read_verbosity() {
 }
 
 sycl::event queue_store::default_event() {
-  const std::lock_guard lock(mutex_);
-  if (!default_event_) default_event_.emplace();
-  return *default_event_;
+  static const sycl::event shared;
+  return shared;
 }
 
 std::uint32_t queue_store::stored_mode(std::uint64_t key) {
@@ -76,7 +52,9 @@ std::atomic<std::uint32_t>& queue_store::status_word(std::uint64_t key) {
 
 void queue_store::record_device_word(std::uint64_t key, std::uint64_t device_word) {
   const std::lock_guard lock(mutex_);
-  device_words_.insert_or_assign(key, device_word);
+  if (last_device_word_ == nullptr || last_device_word_->first != key)
+    last_device_word_ = &*device_words_.try_emplace(key).first;
+  last_device_word_->second = device_word;
 }
 
 classic::error_handler* queue_store::active_handler() {

@@ -7,10 +7,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <mutex>
-#include <optional>
 #include <sycl/sycl.hpp>
 #include <unordered_map>
 
+#include "call/queue_key.hpp"
 #include "lumen_arr.h"
 
 namespace arbor::lumen::vm::detail {
@@ -19,22 +19,8 @@ namespace classic {
 class error_handler;
 }
 
-/// 64-bit FNV-1a of the eight bytes of `value`, lowest byte first.
-constexpr std::uint64_t fnv(std::uint64_t value) {
-  std::uint64_t hash = 0xcbf29ce484222325;
-  for (int byte = 0; byte < 8; ++byte) {
-    hash ^= (value >> (8 * byte)) & 0xff;
-    hash *= 0x100000001b3;
-  }
-  return hash;
-}
-
-/// By what the store knows a queue: its hash, its context and its device. Queues that agree in all
-/// three share one entry, also one after the other. A null queue has key 0.
-std::uint64_t queue_key(const sycl::queue* queue);
-
 /// The process-wide store of per-queue state. Entries are never removed. One mutex guards the maps
-/// and the default event, and is held only around access to them.
+/// and what belongs to the active handler, and is held only around access to them.
 class queue_store {
  public:
   static queue_store& instance();
@@ -75,10 +61,11 @@ class queue_store {
   static constexpr std::size_t first_buckets = 8;
 
   std::mutex mutex_;
-  std::optional<sycl::event> default_event_;
   map<std::uint32_t> modes_{first_buckets};
   map<std::atomic<std::uint32_t>> statuses_{first_buckets};
   map<std::uint64_t> device_words_{first_buckets};
+  /// The entry that was written last: calls come in rows on one queue.
+  map<std::uint64_t>::value_type* last_device_word_ = nullptr;
   classic::error_handler* active_handler_ = nullptr;
   lumen_arr_error_callback saved_callback_ = nullptr;
   std::atomic<std::int32_t> verbosity_{0};

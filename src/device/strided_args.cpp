@@ -83,7 +83,7 @@ template <int NI, int NO>
 strided_args<NI, NO> describe(const input::vxx& record) {
   if (!record.has_slices()) return unit_strides<NI, NO>(whole_count(record));
   if (record.in_slices.size() != NI || record.out_slices.size() != NO)
-    throw std::logic_error("ArborLumen::VM::" + record.name +
+    throw std::logic_error(std::string("ArborLumen::VM::").append(record.name) +
                            ": slice number different from template");
 
   strided_args<NI, NO> args;

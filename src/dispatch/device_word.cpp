@@ -33,9 +33,9 @@ std::uint64_t classify(const sycl::device& device) {
          (identifier ? tier_of(*identifier) : gpu | discrete | beryl);
 }
 
-std::uint64_t of_queue(const sycl::queue& queue) {
-  const std::uint64_t word = classify(queue.get_device());
-  queue_store::instance().record_device_word(queue_key(&queue), word);
+std::uint64_t of_queue(const keyed_queue& queue) {
+  const std::uint64_t word = classify((*queue).get_device());
+  queue_store::instance().record_device_word(queue.key(), word);
   return word;
 }
 

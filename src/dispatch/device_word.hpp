@@ -6,6 +6,8 @@
 #include <cstdint>
 #include <sycl/sycl.hpp>
 
+#include "call/queue_key.hpp"
+
 /// What a queue's device is, as dispatch sees it: a word of bits.
 namespace arbor::lumen::vm::detail::device_word {
 
@@ -30,7 +32,7 @@ inline constexpr std::uint32_t norvane_vendor = 0x51A7;
 /// tier, `beryl`.
 std::uint64_t classify(const sycl::device& device);
 
-/// The word of a queue's device, noted in the store.
-std::uint64_t of_queue(const sycl::queue& queue);
+/// The word of a queue's device, noted in the store. The queue must not be null.
+std::uint64_t of_queue(const keyed_queue& queue);
 
 }  // namespace arbor::lumen::vm::detail::device_word

@@ -18,13 +18,13 @@ constexpr const char* domain = "vector_math";
 /// Marks the queue's status and returns the event of a call that did nothing.
 sycl::event decline(const input::vxx& record) {
   queue_store& store = queue_store::instance();
-  store.status_word(queue_key(record.queue)).fetch_or(enums::bad_argument);
+  store.status_word(record.queue.key()).fetch_or(enums::bad_argument);
   return store.default_event();
 }
 
 }  // namespace
 
-std::uint32_t tuning_factor(std::uint64_t device_word, const std::string&, std::uint64_t precision,
+std::uint32_t tuning_factor(std::uint64_t device_word, std::string_view, std::uint64_t precision,
                             std::uint64_t key) {
   if ((key & key::gpu) == 0) return 1;
   const std::uint64_t vendor = device_word & (device_word::norvane | device_word::integrated);
@@ -45,8 +45,8 @@ std::string unserved_text(std::uint32_t mode, std::uint64_t precision, std::uint
 sycl::event dispatch_call(const input::vxx& record, const implementation_table& table) {
   const std::uint64_t precision = record.precision();
   // A record without a queue has no device; its check says so.
-  const std::uint64_t word = record.queue == nullptr ? 0 : device_word::of_queue(*record.queue);
-  const std::uint64_t key = select_key(precision, word, record.mode, table);
+  const std::uint64_t word = record.queue == nullptr ? 0 : device_word::of_queue(record.queue);
+  const auto [key, entry] = select_row(precision, word, record.mode, table);
 
   const bool throws = (record.mode & enums::badarg_exception) != 0;
   if (!record.check(throws)) {
@@ -56,7 +56,6 @@ sycl::event dispatch_call(const input::vxx& record, const implementation_table& 
           key_to_text(key, true) + "; " + (record.has_slices() ? "api: strided" : "api: linear"));
     return decline(record);
   }
-  const auto* entry = table.find(key);
   if (entry == nullptr) {
     if ((record.mode & enums::mode_missing_throws) != 0)
       throw unimplemented(domain, record.name, unserved_text(record.mode, precision, word));

@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <sycl/sycl.hpp>
 
 #include "call/input.hpp"
@@ -14,7 +15,7 @@ namespace arbor::lumen::vm::detail {
 
 /// How much work per item suits the device: above 1 only on a GPU of the norvane vendor that is not
 /// integrated, by its tier and the precision.
-std::uint32_t tuning_factor(std::uint64_t device_word, const std::string& function_name,
+std::uint32_t tuning_factor(std::uint64_t device_word, std::string_view function_name,
                             std::uint64_t precision, std::uint64_t key);
 
 /// Runs a call on the row of `table` that serves it. The row is looked for before the arguments are

@@ -38,10 +38,20 @@ candidate_list kernel_candidates(std::uint64_t precision, std::uint64_t device_w
   return candidates;
 }
 
+keyed_row select_row(std::uint64_t precision, std::uint64_t device_word, std::uint32_t mode,
+                     const implementation_table& table) {
+  const implementation_table::entry* entry = nullptr;
+  const std::uint64_t key =
+      search(precision, device_word, mode, [&](search_pass, std::uint64_t candidate) {
+        entry = table.find(candidate);
+        return entry != nullptr;
+      });
+  return {key, entry};
+}
+
 std::uint64_t select_key(std::uint64_t precision, std::uint64_t device_word, std::uint32_t mode,
                          const implementation_table& table) {
-  return search(precision, device_word, mode,
-                [&](search_pass, std::uint64_t key) { return table.find(key) != nullptr; });
+  return select_row(precision, device_word, mode, table).key;
 }
 
 }  // namespace arbor::lumen::vm::detail

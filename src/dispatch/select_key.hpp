@@ -81,8 +81,17 @@ std::uint64_t search(std::uint64_t precision, std::uint64_t device_word, std::ui
   return climb(search_pass::host, start, finest, candidates, accept);
 }
 
-/// The key of the row that serves a call: the first key of the search that `table` holds, 0 if it
-/// holds none.
+/// A row with its key; 0 and null if there is none.
+struct keyed_row {
+  std::uint64_t key;
+  const implementation_table::entry* entry;
+};
+
+/// The row that serves a call: the first of the search that `table` holds.
+keyed_row select_row(std::uint64_t precision, std::uint64_t device_word, std::uint32_t mode,
+                     const implementation_table& table);
+
+/// The key of that row.
 std::uint64_t select_key(std::uint64_t precision, std::uint64_t device_word, std::uint32_t mode,
                          const implementation_table& table);
 

@@ -6,6 +6,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <span>
+#include <string_view>
 #include <sycl/sycl.hpp>
 #include <vector>
 
@@ -14,7 +15,7 @@
 namespace arbor::lumen::vm::detail {
 
 /// The mode of one call: what is in force on the queue, with the groups that the caller named.
-std::uint32_t effective_mode(sycl::queue& queue, enums::mode mode);
+std::uint32_t effective_mode(const keyed_queue& queue, enums::mode mode);
 
 /// Builds the argument record of one call, operand by operand in argument order, and runs it.
 template <typename Record>
@@ -23,22 +24,17 @@ class call;
 template <input::form Form, typename Shape, typename T, typename U>
 class call<input::record<Form, Shape, T, U>> {
  public:
-  call(const char* name, sycl::queue& queue, std::int64_t n, enums::mode mode) {
-    record_.name = name;
-    record_.queue = &queue;
-    record_.n = n;
-    record_.mode = effective_mode(queue, mode);
-    record_.in_pointers.reserve(Shape::inputs);
-    record_.out_pointers.reserve(Shape::outputs);
+  call(std::string_view name, sycl::queue& queue, std::int64_t n, enums::mode mode) {
+    describe(name, queue, n, mode);
+  }
+  call(std::string_view name, sycl::queue& queue, std::int64_t n, enums::mode mode,
+       const error_handler<U>& handler)
+      : record_(handler) {
+    describe(name, queue, n, mode);
   }
 
   call& after(const std::vector<sycl::event>& depends) {
     record_.depends = depends;
-    return *this;
-  }
-  call& with(const error_handler<U>& handler) {
-    record_.handler = handler;
-    has_handler_ = true;
     return *this;
   }
 
@@ -99,15 +95,16 @@ class call<input::record<Form, Shape, T, U>> {
     return out(y);
   }
 
-  sycl::event run(sycl::event (*dispatcher)(const input::vxx&)) {
-    // Kernels on buffers write to the handler's buffer, also where it reports nothing, so that
-    // every call needs one of its own.
-    if (!has_handler_) record_.handler = error_handler<U>();
-    return dispatcher(record_);
-  }
+  sycl::event run(sycl::event (*dispatcher)(const input::vxx&)) { return dispatcher(record_); }
 
  private:
-  bool has_handler_ = false;
+  void describe(std::string_view name, sycl::queue& queue, std::int64_t n, enums::mode mode) {
+    record_.name = name;
+    record_.queue = &queue;
+    record_.n = n;
+    record_.mode = effective_mode(record_.queue, mode);
+  }
+
   input::record<Form, Shape, T, U> record_;
 };
 

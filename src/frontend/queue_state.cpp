@@ -9,10 +9,16 @@
 
 namespace arbor::lumen::vm {
 
+namespace {
+
+std::uint32_t mode_in_force(std::uint64_t key) {
+  return detail::mode_word::in_force(detail::queue_store::instance().stored_mode(key));
+}
+
+}  // namespace
+
 enums::mode get_mode(sycl::queue& queue) {
-  const std::uint32_t stored =
-      detail::queue_store::instance().stored_mode(detail::queue_key(&queue));
-  return static_cast<enums::mode>(detail::mode_word::in_force(stored));
+  return static_cast<enums::mode>(mode_in_force(detail::queue_key(&queue)));
 }
 
 enums::mode set_mode(sycl::queue& queue, enums::mode mode) {
@@ -34,8 +40,8 @@ enums::status clear_status(sycl::queue& queue) { return set_status(queue, enums:
 
 namespace detail {
 
-std::uint32_t effective_mode(sycl::queue& queue, enums::mode mode) {
-  return mode_word::merge(get_mode(queue), mode);
+std::uint32_t effective_mode(const keyed_queue& queue, enums::mode mode) {
+  return mode_word::merge(mode_in_force(queue.key()), mode);
 }
 
 }  // namespace detail

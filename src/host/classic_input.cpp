@@ -3,8 +3,6 @@
 
 #include "host/classic_input.hpp"
 
-#include <string>
-
 #include "arbor/lumen/exception.hpp"
 
 namespace arbor::lumen::vm::detail::classic::input {
@@ -18,7 +16,7 @@ bool vxx::check(bool throw_on_error) const {
 }
 
 void vxx::reject_index(const char* message) const {
-  detail::input::throw_logic_error(std::string(name), message);
+  detail::input::throw_logic_error(name, message);
 }
 
 }  // namespace arbor::lumen::vm::detail::classic::input

@@ -11,6 +11,7 @@
 #include <string_view>
 
 #include "call/arguments.hpp"
+#include "call/operand_list.hpp"
 #include "host/error_handler.hpp"
 
 /// The arguments of a host call as plain memory: what an executor makes of a record of a call, and
@@ -39,17 +40,6 @@ class vxx {
   [[noreturn]] void reject_index(const char* message) const;
 };
 
-/// Lists of at most as many entries as a call has operands.
-template <typename V>
-struct operand_list {
-  static constexpr std::size_t capacity = 4;
-  std::array<V, capacity> entries{};
-  std::size_t size = 0;
-
-  void push_back(V value) { entries[size++] = value; }
-  bool empty() const { return size == 0; }
-};
-
 template <typename T, typename U>
 class typed_vxx : public vxx {
  public:
@@ -68,8 +58,8 @@ class typed_vxx : public vxx {
  protected:
   template <typename V>
   V at(const operand_list<V>& list, std::size_t i, const char* message) const {
-    if (i >= list.size) reject_index(message);
-    return list.entries[i];
+    if (i >= list.size()) reject_index(message);
+    return list[i];
   }
 };
 
@@ -153,7 +143,7 @@ class strided final : public typed_vxx<T, U> {
     }
     for (std::int64_t done = 0; done <= count; done += pass) {
       for (std::size_t k = 0; k < Shape::inputs; ++k) {
-        const std::int64_t element = count > 0 ? (done / i_divisors.entries[k]) % i_size(k) : 0;
+        const std::int64_t element = count > 0 ? (done / i_divisors[k]) % i_size(k) : 0;
         args.in[k] = this->ptr_in(k) + i_start(k) + element * i_stride(k);
       }
       for (std::size_t j = 0; j < Shape::outputs; ++j)

@@ -162,17 +162,17 @@ sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& e
     object.run(entries, operands.constants);
   };
   const auto plan_of = device::describe<Shape::inputs, Shape::outputs>;
-  if (const auto* buffers = exactly<input::buffer::linear<Shape, T, U>>(record)) {
-    const accessed_arguments<Shape, T, U> args(*buffers);
-    linear<Shape, T, U> object(record.name, kind.mode, record.effective_count(), nullptr);
-    run(*buffers, object, args.get());
-  } else if (const auto* arrays = exactly<input::usm::linear<Shape, T, U>>(record)) {
+  if (const auto* arrays = exactly<input::usm::linear<Shape, T, U>>(record)) {
     wait_for(record.depends);
     const std::int64_t n = record.effective_count();
     const auto count = [n](std::size_t) { return n; };
     const staged_arguments<Shape, T, U> args(*arrays, count, count);
     linear<Shape, T, U> object(record.name, kind.mode, n, nullptr);
     run(*arrays, object, args.get());
+  } else if (const auto* buffers = exactly<input::buffer::linear<Shape, T, U>>(record)) {
+    const accessed_arguments<Shape, T, U> args(*buffers);
+    linear<Shape, T, U> object(record.name, kind.mode, record.effective_count(), nullptr);
+    run(*buffers, object, args.get());
   } else if (const auto* buffer_slices = exactly<input::buffer::strided<Shape, T, U>>(record)) {
     const auto plan = plan_of(record);
     const accessed_arguments<Shape, T, U> args(*buffer_slices);

@@ -31,8 +31,8 @@ void* usm_wrapper_base::wrap(sycl::queue& queue, void* pointer, std::int64_t cou
                              bool is_output) {
   if (pointer == nullptr) return nullptr;
   if (count != 0) {
-    if (!is_device_memory(pointer, queue.get_context())) return pointer;
     if (queue.get_device().is_cpu()) return pointer;
+    if (!is_device_memory(pointer, queue.get_context())) return pointer;
   }
   std::size_t bytes;
   if (__builtin_mul_overflow(count, element_size, &bytes)) bytes = unallocatable;

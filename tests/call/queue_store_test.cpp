@@ -170,13 +170,13 @@ TEST(EffectiveMode, IsTheQueuesWithTheCallersGroups) {
   namespace enums = arbor::lumen::vm::enums;
   static std::deque<sycl::queue> kept;  // a later queue in the place of one would meet its mode
   sycl::queue& queue = kept.emplace_back();
-  EXPECT_EQ(0x1811204u, effective_mode(queue, enums::not_defined));
-  EXPECT_EQ(0x182120Cu, effective_mode(queue, enums::la | enums::badarg_quiet));
+  EXPECT_EQ(0x1811204u, effective_mode(&queue, enums::not_defined));
+  EXPECT_EQ(0x182120Cu, effective_mode(&queue, enums::la | enums::badarg_quiet));
   queue_store::instance().merge_mode(queue_key(&queue), 15);
-  EXPECT_EQ(0x181120Fu, effective_mode(queue, enums::not_defined));
-  EXPECT_EQ(0x181120Cu, effective_mode(queue, enums::la));
+  EXPECT_EQ(0x181120Fu, effective_mode(&queue, enums::not_defined));
+  EXPECT_EQ(0x181120Cu, effective_mode(&queue, enums::la));
   // A call's mode is for that call alone.
-  EXPECT_EQ(0x181120Fu, effective_mode(queue, enums::not_defined));
+  EXPECT_EQ(0x181120Fu, effective_mode(&queue, enums::not_defined));
 }
 
 }  // namespace

@@ -11,13 +11,12 @@
 namespace {
 
 using namespace arbor::lumen::tests;
-using arbor::lumen::vm::detail::queue_key;
 using arbor::lumen::vm::detail::queue_store;
 
 /// Launches a record, waits, and says what came of it.
 template <typename Shape, typename Record>
 outcome launched(const Record& record) {
-  auto& word = queue_store::instance().status_word(queue_key(record.queue));
+  auto& word = queue_store::instance().status_word(record.queue.key());
   word = 0;
   outcome result;
   try {

@@ -14,11 +14,10 @@ def _definition(function: Function, letter: str, form: Form) -> str:
     out_element = ELEMENT_TYPES[function.output_letter(letter)]
     record = f"input::{form.record}<shape::{function.shape}, {element}, {out_element}>"
     count = "n" if form.counted else "0"
+    handler = ", handler" if function.handler else ""
     steps = []
     if form.memory == "pointer":
         steps.append("after(depends)")  # the span forms take the argument and do not wait for it
-    if function.handler:
-        steps.append("with(handler)")
     for parameter in function.parameters:
         verb = {"in": "in", "constant": "constant", "out": "out"}[parameter.kind]
         with_slice = form.strided and parameter.kind != "constant"
@@ -30,7 +29,7 @@ def _definition(function: Function, letter: str, form: Form) -> str:
         parameters = [text.removesuffix(" depends") for text in parameters]
     return (
         wrap_call(f"sycl::event {function.name}(", parameters, ") {") + "\n"
-        f'  return call<{record}>("{function.name}", queue, {count}, mode){chain}\n'
+        f'  return call<{record}>("{function.name}", queue, {count}, mode{handler}){chain}\n'
         f"      .run(arbor::lumen::vm::detail::{function.name}_dispatch);\n}}\n"
     )
 
