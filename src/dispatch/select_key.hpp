@@ -18,6 +18,7 @@ namespace arbor::lumen::vm::detail {
 /// Partial keys (precision, device and feature, no accuracy) in the order in which they are tried.
 class candidate_list {
  public:
+  candidate_list() {}  // slots get their values with a push
   void push_front(std::uint64_t candidate) { slots_[--first_] = candidate; }
   void push_back(std::uint64_t candidate) { slots_[last_++] = candidate; }
   const std::uint64_t* begin() const { return slots_.data() + first_; }
@@ -26,7 +27,7 @@ class candidate_list {
 
  private:
   static constexpr std::size_t middle = 8;
-  std::array<std::uint64_t, 16> slots_{};
+  std::array<std::uint64_t, 16> slots_;
   std::size_t first_ = middle;
   std::size_t last_ = middle;
 };

@@ -3,15 +3,19 @@
 
 #include "dispatch/table.hpp"
 
+#include <algorithm>
+#include <bit>
+
 namespace arbor::lumen::vm::detail {
 
-implementation_table::implementation_table(std::initializer_list<row> rows) : entries_(8) {
-  for (const row& r : rows) entries_.emplace(r.key, entry{r.run, r.implementation});
-}
-
-const implementation_table::entry* implementation_table::find(std::uint64_t key) const {
-  const auto found = entries_.find(key);
-  return found == entries_.end() ? nullptr : &found->second;
+implementation_table::implementation_table(std::initializer_list<row> rows)
+    : slots_(std::bit_ceil(std::max<std::size_t>(2 * rows.size(), 8))) {
+  for (const row& r : rows) {
+    slot& place = slots_[place_of(r.key)];
+    if (place.key != 0) continue;
+    place = {r.key, {r.run, r.implementation}};
+    ++size_;
+  }
 }
 
 }  // namespace arbor::lumen::vm::detail

@@ -8,7 +8,7 @@
 #include <functional>
 #include <initializer_list>
 #include <sycl/sycl.hpp>
-#include <unordered_map>
+#include <vector>
 
 #include "call/input.hpp"
 #include "device/tuning_info.hpp"
@@ -27,6 +27,7 @@ class implementation_table {
     const char* implementation;  ///< name of the functor or of the host kernel behind the row
   };
 
+  /// Of rows with the same key the first counts. No row has key 0.
   implementation_table(std::initializer_list<row> rows);
 
   struct entry {
@@ -34,21 +35,37 @@ class implementation_table {
     const char* implementation;
   };
   /// The entry of a key, null if there is none.
-  const entry* find(std::uint64_t key) const;
+  const entry* find(std::uint64_t key) const {
+    const slot& found = slots_[place_of(key)];
+    return found.key == 0 ? nullptr : &found.value;
+  }
 
-  std::size_t size() const { return entries_.size(); }
+  std::size_t size() const { return size_; }
 
   /// Calls `visit(key, entry)` for every row, in no particular order.
   template <typename Visit>
   void for_each(Visit visit) const {
-    for (const auto& [key, value] : entries_) visit(key, value);
+    for (const slot& each : slots_) {
+      if (each.key != 0) visit(each.key, each.value);
+    }
   }
 
  private:
-  struct hash {
-    std::size_t operator()(std::uint64_t key) const { return key % 997; }
+  struct slot {
+    std::uint64_t key = 0;  ///< 0: empty
+    entry value{};
   };
-  std::unordered_map<std::uint64_t, entry, hash> entries_;
+
+  /// Where the key stands, or the empty place at which the search for it ends.
+  std::size_t place_of(std::uint64_t key) const {
+    const std::size_t mask = slots_.size() - 1;
+    std::size_t place = key % 997 & mask;
+    while (slots_[place].key != key && slots_[place].key != 0) place = (place + 1) & mask;
+    return place;
+  }
+
+  std::vector<slot> slots_;  ///< a power of two of them, at most half of them taken
+  std::size_t size_ = 0;
 };
 
 }  // namespace arbor::lumen::vm::detail

@@ -10,7 +10,6 @@
 #include <string>
 #include <type_traits>
 #include <typeinfo>
-#include <variant>
 #include <vector>
 
 #include "call/queue_store.hpp"
@@ -76,10 +75,11 @@ class staged_arguments {
  public:
   template <typename InCount, typename OutCount>
   staged_arguments(const input::typed_vxx<T, U>& record, InCount in_count, OutCount out_count) {
+    const host::staging_queue on(*record.queue);
     for (std::size_t k = 0; k < Shape::inputs; ++k)
-      args_.in[k] = inputs_[k].wrap(*record.queue, record.in_pointer(k), in_count(k));
+      args_.in[k] = inputs_[k].wrap(on, record.in_pointer(k), in_count(k));
     for (std::size_t j = 0; j < Shape::outputs; ++j)
-      args_.out[j] = outputs_[j].wrap(*record.queue, record.out_pointer(j), out_count(j), true);
+      args_.out[j] = outputs_[j].wrap(on, record.out_pointer(j), out_count(j), true);
     for (std::size_t c = 0; c < Shape::constants; ++c) args_.constants[c] = record.constant(c);
   }
   const arguments<Shape, T, U>& get() const { return args_; }
@@ -110,33 +110,25 @@ strided<Shape, T, U> with_slices(const input::vxx& record, std::int64_t mode,
   return object;
 }
 
-/// The handler of a call, of the class that its errors ask for. It is made inactive, and nothing
-/// here makes it active: a host call reports no status.
-template <typename T, typename U>
-class call_handler {
- public:
-  call_handler(const input::typed_vxx<T, U>& record, error_kind errors) {
-    switch (errors) {
-      case error_kind::none:
-        handler_.template emplace<0>(record);
-        break;
-      case error_kind::one_result:
-        handler_.template emplace<1>(record);
-        break;
-      case error_kind::two_results:
-        handler_.template emplace<2>(record);
-        break;
+/// Calls `run` with a handler for the call, of the class that its errors ask for. It is made
+/// inactive, and nothing here makes it active: a host call reports no status.
+template <typename T, typename U, typename Run>
+void with_handler(const input::typed_vxx<T, U>& record, error_kind errors, Run&& run) {
+  switch (errors) {
+    case error_kind::none: {
+      classic::error_handler_typed_var0<T, U> handler(record);
+      return run(handler);
+    }
+    case error_kind::one_result: {
+      classic::error_handler_typed_var1<T, U> handler(record);
+      return run(handler);
+    }
+    case error_kind::two_results: {
+      classic::error_handler_typed_var2<T, U> handler(record);
+      return run(handler);
     }
   }
-  classic::error_handler* get() {
-    return std::visit([](auto& handler) -> classic::error_handler* { return &handler; }, handler_);
-  }
-
- private:
-  std::variant<classic::error_handler_typed_var0<T, U>, classic::error_handler_typed_var1<T, U>,
-               classic::error_handler_typed_var2<T, U>>
-      handler_;
-};
+}
 
 /// The record as `Record` if it is one. Records have final classes, so the types are compared,
 /// which takes a fraction of a dynamic cast.
@@ -157,9 +149,11 @@ sycl::event execute(const input::vxx& record, const host_entries<Shape, T, U>& e
   const auto run = [&](const input::typed_vxx<T, U>& typed, auto& object, const auto& operands) {
     for (const T* in : operands.in) object.in_pointers.push_back(in);
     for (U* out : operands.out) object.out_pointers.push_back(out);
-    call_handler<T, U> handler(typed, kind.errors);
-    object.handler = handler.get();
-    object.run(entries, operands.constants);
+    const auto run_with = [&](classic::error_handler& handler) {
+      object.handler = &handler;
+      object.run(entries, operands.constants);
+    };
+    with_handler(typed, kind.errors, run_with);
   };
   const auto plan_of = device::describe<Shape::inputs, Shape::outputs>;
   if (const auto* arrays = exactly<input::usm::linear<Shape, T, U>>(record)) {

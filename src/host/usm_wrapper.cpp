@@ -26,14 +26,10 @@ bool is_device_memory(const void* pointer, const sycl::context& context) {
 
 }  // namespace
 
-void* usm_wrapper_base::wrap(sycl::queue& queue, void* pointer, std::int64_t count,
-                             std::size_t element_size, std::size_t element_alignment,
-                             bool is_output) {
-  if (pointer == nullptr) return nullptr;
-  if (count != 0) {
-    if (queue.get_device().is_cpu()) return pointer;
-    if (!is_device_memory(pointer, queue.get_context())) return pointer;
-  }
+void* usm_wrapper_base::stage(sycl::queue& queue, void* pointer, std::int64_t count,
+                              std::size_t element_size, std::size_t element_alignment,
+                              bool is_output) {
+  if (count != 0 && !is_device_memory(pointer, queue.get_context())) return pointer;
   std::size_t bytes;
   if (__builtin_mul_overflow(count, element_size, &bytes)) bytes = unallocatable;
   // An allocation of nothing may be null and be no failure; so one element is asked for then.
@@ -55,8 +51,7 @@ void* usm_wrapper_base::wrap(sycl::queue& queue, void* pointer, std::int64_t cou
   return copy;
 }
 
-usm_wrapper_base::~usm_wrapper_base() {
-  if (host_ptr_ == nullptr) return;
+void usm_wrapper_base::finish() {
   if (is_output_ && bytes_ != 0) queue_->memcpy(device_ptr_, host_ptr_, bytes_).wait();
   sycl::free(host_ptr_, *queue_);
 }

@@ -9,6 +9,14 @@
 
 namespace arbor::lumen::vm::detail::host {
 
+/// The queue of a call and what its arrays need to know of it.
+struct staging_queue {
+  explicit staging_queue(sycl::queue& callers)
+      : queue(callers), is_cpu(callers.get_device().is_cpu()) {}
+  sycl::queue& queue;
+  bool is_cpu;
+};
+
 /// The untyped half of `usm_wrapper`.
 class usm_wrapper_base {
  public:
@@ -16,13 +24,22 @@ class usm_wrapper_base {
   usm_wrapper_base(const usm_wrapper_base&) = delete;
   usm_wrapper_base& operator=(const usm_wrapper_base&) = delete;
   /// Copies an output back and frees the copy. A failure here ends the process.
-  ~usm_wrapper_base();
+  ~usm_wrapper_base() {
+    if (host_ptr_ != nullptr) finish();
+  }
 
  protected:
-  void* wrap(sycl::queue& queue, void* pointer, std::int64_t count, std::size_t element_size,
-             std::size_t element_alignment, bool is_output);
+  void* wrap(const staging_queue& on, void* pointer, std::int64_t count, std::size_t element_size,
+             std::size_t element_alignment, bool is_output) {
+    if (pointer == nullptr || (count != 0 && on.is_cpu)) return pointer;
+    return stage(on.queue, pointer, count, element_size, element_alignment, is_output);
+  }
 
  private:
+  void* stage(sycl::queue& queue, void* pointer, std::int64_t count, std::size_t element_size,
+              std::size_t element_alignment, bool is_output);
+  void finish();
+
   bool is_output_ = false;
   void* host_ptr_ = nullptr;
   void* device_ptr_ = nullptr;
@@ -38,12 +55,12 @@ class usm_wrapper : public usm_wrapper_base {
   /// The pointer that the host may use for the `count` elements at `pointer`; null for null.
   /// Outputs are copied in as well, so that elements outside a slice keep their values.
   /// @throws invalid_argument if there is no host memory left
-  T* wrap(sycl::queue& queue, T* pointer, std::int64_t count, bool is_output) {
+  T* wrap(const staging_queue& on, T* pointer, std::int64_t count, bool is_output) {
     return static_cast<T*>(
-        usm_wrapper_base::wrap(queue, pointer, count, sizeof(T), alignof(T), is_output));
+        usm_wrapper_base::wrap(on, pointer, count, sizeof(T), alignof(T), is_output));
   }
-  const T* wrap(sycl::queue& queue, const T* pointer, std::int64_t count) {
-    return wrap(queue, const_cast<T*>(pointer), count, false);
+  const T* wrap(const staging_queue& on, const T* pointer, std::int64_t count) {
+    return wrap(on, const_cast<T*>(pointer), count, false);
   }
 };
 

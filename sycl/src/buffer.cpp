@@ -17,11 +17,6 @@ namespace sycl::detail {
 buffer_memory::~buffer_memory() = default;
 final_destination::~final_destination() = default;
 
-view_handle buffer_view::make(buffer_description description, std::unique_ptr<buffer_memory> memory,
-                              const property_list& properties) {
-  return buffer_storage::make(std::move(description), std::move(memory), properties);
-}
-
 view_handle buffer_view::part(std::size_t offset, std::size_t bytes) {
   const std::size_t begin = region_.begin + offset;
   return view_handle(new buffer_view(whole(), {region_.storage, begin, begin + bytes}, true));

@@ -30,10 +30,11 @@ std::size_t bytes_of(const buffer_description& description) {
 
 }  // namespace
 
-buffer_storage::buffer_storage(buffer_description described, std::unique_ptr<buffer_memory> memory,
+buffer_storage::buffer_storage(const buffer_description& described,
+                               std::unique_ptr<buffer_memory> memory,
                                const property_list& buffer_properties)
     : properties(buffer_properties),
-      description_(std::move(described)),
+      description_(described),
       memory_(std::move(memory)),
       data_(const_cast<void*>(description_.initial)),
       in_place_(
@@ -59,11 +60,10 @@ buffer_storage::~buffer_storage() {
   }
 }
 
-view_handle buffer_storage::make(buffer_description description,
-                                 std::unique_ptr<buffer_memory> memory,
-                                 const property_list& properties) {
-  auto made =
-      std::make_shared<buffer_storage>(std::move(description), std::move(memory), properties);
+view_handle buffer_view::make(const buffer_description& description,
+                              std::unique_ptr<buffer_memory> memory,
+                              const property_list& properties) {
+  auto made = std::make_shared<buffer_storage>(description, std::move(memory), properties);
   buffer_storage& storage = *made;
   storage.self_ = std::move(made);
   return view_handle(&storage.whole_);

@@ -17,14 +17,12 @@ namespace sycl::detail {
 /// is complete; until then the view of the whole buffer owns it.
 class buffer_storage {
  public:
-  buffer_storage(buffer_description description, std::unique_ptr<buffer_memory> memory,
+  buffer_storage(const buffer_description& description, std::unique_ptr<buffer_memory> memory,
                  const property_list& properties);
   ~buffer_storage();
   buffer_storage(const buffer_storage&) = delete;
   buffer_storage& operator=(const buffer_storage&) = delete;
 
-  static view_handle make(buffer_description description, std::unique_ptr<buffer_memory> memory,
-                          const property_list& properties);
   /// For a command. The buffer must be alive.
   const std::shared_ptr<buffer_storage>& self() const noexcept { return self_; }
 
@@ -58,6 +56,8 @@ class buffer_storage {
   }
 
  private:
+  friend class buffer_view;
+
   std::size_t bytes() const noexcept { return whole_.size(); }
   void allocate();
   /// Keeps the mutex of property::buffer::use_mutex, if there is one.

@@ -129,11 +129,13 @@ TEST_F(HostStaging, EarlierCopiesGoWhereALaterOneFails) {
   array<float> a(gpu_, memory::device, {1, 2, 3});
   const void* first = nullptr;
   EXPECT_EQ(message_of<arbor::lumen::invalid_argument>([&] {
-              arbor::lumen::vm::detail::host::usm_wrapper<float> one, other;
-              float* const copy = one.wrap(gpu_, a.data(), 3, true);
+              namespace host = arbor::lumen::vm::detail::host;
+              const host::staging_queue on(gpu_);
+              host::usm_wrapper<float> one, other;
+              float* const copy = one.wrap(on, a.data(), 3, true);
               first = copy;
               copy[1] = 7;
-              other.wrap(gpu_, a.data(), std::int64_t{1} << 60, false);
+              other.wrap(on, a.data(), std::int64_t{1} << 60, false);
             }),
             no_memory);
   EXPECT_EQ(pointer_type(first, gpu_), sycl::usm::alloc::unknown);

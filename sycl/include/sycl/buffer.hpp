@@ -300,7 +300,7 @@ class buffer {
     description.elements = extents.size();
     description.element_size = sizeof(T);
     view_ = detail::buffer_view::make(
-        std::move(description), detail::memory_of<plain>(plain_allocator(allocator_)), properties);
+        description, detail::memory_of<plain>(plain_allocator(allocator_)), properties);
   }
   buffer(const std::vector<element>& contents, AllocatorT allocator,
          const property_list& properties)

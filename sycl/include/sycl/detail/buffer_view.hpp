@@ -75,8 +75,8 @@ class ARBOR_LUMEN_SYCL_API buffer_view {
   buffer_view& operator=(const buffer_view&) = delete;
 
   /// A null `memory` stands for the default allocator's.
-  static view_handle make(buffer_description description, std::unique_ptr<buffer_memory> memory,
-                          const property_list& properties);
+  static view_handle make(const buffer_description& description,
+                          std::unique_ptr<buffer_memory> memory, const property_list& properties);
   /// A part of this view, which starts `offset` bytes into it.
   view_handle part(std::size_t offset, std::size_t bytes);
   /// All of this view, as elements of another type.
