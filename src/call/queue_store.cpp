@@ -8,15 +8,25 @@
 #include "call/mode_word.hpp"
 
 namespace arbor::lumen::vm::detail {
+template <typename Word>
+std::atomic<Word>& queue_words<Word>::look_up(std::uint64_t key) {
+  const std::lock_guard lock(mutex_);
+  entry& found = *words_.try_emplace(key).first;
+  recent(key).store(&found, std::memory_order_release);
+  return found.second;
+}
+
+template class queue_words<std::uint32_t>;
+template class queue_words<std::uint64_t>;
+
 queue_store& queue_store::instance() {
   static queue_store store;
-  store.read_verbosity();
+  // A level of 0 doubles as the mark that nothing was read, so it alone is read again.
+  if (store.verbosity_.load(std::memory_order_relaxed) == 0) store.read_verbosity();
   return store;
 }
 
-// A level of 0 doubles as the mark that nothing was read, so it alone is read again.
 void queue_store::read_verbosity() {
-  if (verbosity_.load(std::memory_order_relaxed) != 0) return;
   const char* text = std::getenv("ARBORLUMEN_VM_VERBOSE");
   const bool digit = text != nullptr && *text >= '0' && *text <= '9';
   verbosity_.store(digit ? *text - '0' : -1, std::memory_order_relaxed);
@@ -27,34 +37,21 @@ sycl::event queue_store::default_event() {
   return shared;
 }
 
-std::uint32_t queue_store::stored_mode(std::uint64_t key) {
-  const std::lock_guard lock(mutex_);
-  const auto entry = modes_.find(key);
-  return entry == modes_.end() ? 0 : entry->second;
-}
-
 std::uint32_t queue_store::merge_mode(std::uint64_t key, std::uint32_t mode) {
-  const std::lock_guard lock(mutex_);
-  const auto entry = modes_.find(key);
-  if (entry == modes_.end()) {
-    modes_.emplace(key, mode_word::merge(enums::default_mode, mode));
-    return 0;
+  std::atomic<std::uint32_t>& stored = modes_[key];
+  std::uint32_t before = stored.load(std::memory_order_relaxed);
+  const auto merged = [&] {
+    return mode_word::merge(before != 0 ? before : enums::default_mode, mode);
+  };
+  while (!stored.compare_exchange_weak(before, merged(), std::memory_order_relaxed)) {
   }
-  const std::uint32_t before = entry->second;
-  entry->second = mode_word::merge(before, mode);
   return before;
 }
 
-std::atomic<std::uint32_t>& queue_store::status_word(std::uint64_t key) {
-  const std::lock_guard lock(mutex_);
-  return statuses_.try_emplace(key, 0u).first->second;
-}
-
 void queue_store::record_device_word(std::uint64_t key, std::uint64_t device_word) {
-  const std::lock_guard lock(mutex_);
-  if (last_device_word_ == nullptr || last_device_word_->first != key)
-    last_device_word_ = &*device_words_.try_emplace(key).first;
-  last_device_word_->second = device_word;
+  std::atomic<std::uint64_t>& noted = device_words_[key];
+  if (noted.load(std::memory_order_relaxed) != device_word)
+    noted.store(device_word, std::memory_order_relaxed);
 }
 
 classic::error_handler* queue_store::active_handler() {

@@ -3,6 +3,7 @@
 
 #pragma once
 
+#include <array>
 #include <atomic>
 #include <cstddef>
 #include <cstdint>
@@ -19,8 +20,38 @@ namespace classic {
 class error_handler;
 }
 
-/// The process-wide store of per-queue state. Entries are never removed. One mutex guards the maps
-/// and what belongs to the active handler, and is held only around access to them.
+/// A word for each queue by its key, 0 until it is set. Entries are never removed and never move.
+template <typename Word>
+class queue_words {
+ public:
+  /// The mutex guards the map and is held only around access to it.
+  explicit queue_words(std::mutex& mutex) : mutex_(mutex) {}
+
+  /// The word of a queue. The reference is valid as long as the map is.
+  std::atomic<Word>& operator[](std::uint64_t key) {
+    entry* const known = recent(key).load(std::memory_order_acquire);
+    return known != nullptr && known->first == key ? known->second : look_up(key);
+  }
+
+ private:
+  struct fnv_hash {
+    std::size_t operator()(std::uint64_t key) const { return fnv(key); }
+  };
+  using map = std::unordered_map<std::uint64_t, std::atomic<Word>, fnv_hash>;
+  using entry = typename map::value_type;
+  static constexpr std::size_t first_buckets = 8;
+  static constexpr int recent_bits = 4;
+
+  std::atomic<entry*>& recent(std::uint64_t key) { return recent_[key >> (64 - recent_bits)]; }
+  std::atomic<Word>& look_up(std::uint64_t key);
+
+  std::mutex& mutex_;
+  map words_{first_buckets};
+  /// Entries that were found lately: calls come in rows on a few queues, and take no lock then.
+  std::array<std::atomic<entry*>, 1 << recent_bits> recent_{};
+};
+
+/// The process-wide store of per-queue state, with one mutex for all of it.
 class queue_store {
  public:
   static queue_store& instance();
@@ -29,15 +60,16 @@ class queue_store {
   sycl::event default_event();
 
   /// The mode word stored for a queue, 0 if there is none.
-  std::uint32_t stored_mode(std::uint64_t key);
+  std::uint32_t stored_mode(std::uint64_t key) {
+    return modes_[key].load(std::memory_order_relaxed);
+  }
 
   /// Merges `mode` into the stored word, or into the default word if there is none.
   /// @returns the word stored before, 0 if there was none.
   std::uint32_t merge_mode(std::uint64_t key, std::uint32_t mode);
 
-  /// The status word of a queue, made at zero if absent. The reference stays valid as long as the
-  /// store lives, so it may be ored into outside the lock.
-  std::atomic<std::uint32_t>& status_word(std::uint64_t key);
+  /// The status word of a queue. The reference stays valid as long as the store lives.
+  std::atomic<std::uint32_t>& status_word(std::uint64_t key) { return statuses_[key]; }
 
   /// Notes what the queue's device was classified as.
   void record_device_word(std::uint64_t key, std::uint64_t device_word);
@@ -53,19 +85,10 @@ class queue_store {
   queue_store() = default;
   void read_verbosity();
 
-  struct fnv_hash {
-    std::size_t operator()(std::uint64_t key) const { return fnv(key); }
-  };
-  template <typename V>
-  using map = std::unordered_map<std::uint64_t, V, fnv_hash>;
-  static constexpr std::size_t first_buckets = 8;
-
   std::mutex mutex_;
-  map<std::uint32_t> modes_{first_buckets};
-  map<std::atomic<std::uint32_t>> statuses_{first_buckets};
-  map<std::uint64_t> device_words_{first_buckets};
-  /// The entry that was written last: calls come in rows on one queue.
-  map<std::uint64_t>::value_type* last_device_word_ = nullptr;
+  queue_words<std::uint32_t> modes_{mutex_};
+  queue_words<std::uint32_t> statuses_{mutex_};
+  queue_words<std::uint64_t> device_words_{mutex_};
   classic::error_handler* active_handler_ = nullptr;
   lumen_arr_error_callback saved_callback_ = nullptr;
   std::atomic<std::int32_t> verbosity_{0};

@@ -9,7 +9,7 @@
 namespace arbor::lumen::vm::detail {
 
 implementation_table::implementation_table(std::initializer_list<row> rows)
-    : slots_(std::bit_ceil(std::max<std::size_t>(2 * rows.size(), 8))) {
+    : slots_(std::bit_ceil(std::max<std::size_t>(2 * rows.size(), 8))), mask_(slots_.size() - 1) {
   for (const row& r : rows) {
     slot& place = slots_[place_of(r.key)];
     if (place.key != 0) continue;

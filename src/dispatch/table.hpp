@@ -58,13 +58,13 @@ class implementation_table {
 
   /// Where the key stands, or the empty place at which the search for it ends.
   std::size_t place_of(std::uint64_t key) const {
-    const std::size_t mask = slots_.size() - 1;
-    std::size_t place = key % 997 & mask;
-    while (slots_[place].key != key && slots_[place].key != 0) place = (place + 1) & mask;
+    std::size_t place = key % 997 & mask_;
+    while (slots_[place].key != key && slots_[place].key != 0) place = (place + 1) & mask_;
     return place;
   }
 
   std::vector<slot> slots_;  ///< a power of two of them, at most half of them taken
+  std::size_t mask_;         ///< their number less one
   std::size_t size_ = 0;
 };
 

@@ -47,7 +47,9 @@ std::shared_ptr<context_impl> make_context_impl(std::vector<std::shared_ptr<devi
 std::shared_ptr<context_impl> default_context(const platform_impl& platform) {
   const std::lock_guard lock(platform.default_context_mutex);
   if (platform.default_context == nullptr) {
-    platform.default_context = make_context_impl(platform.devices, {}, {});
+    // It lives as long as the process, like the platform, so its handles count nothing.
+    platform.default_context = {std::shared_ptr<void>(),
+                                new context_impl(platform.devices, {}, {})};
   }
   return platform.default_context;
 }

@@ -6,6 +6,7 @@
 #include <unordered_map>
 
 #include "context_impl.hpp"
+#include "device_impl.hpp"
 #include "queue_impl.hpp"
 
 namespace sycl::detail::native_objects {
@@ -42,6 +43,10 @@ void forget(const void* object) noexcept {
 }
 
 std::shared_ptr<context_impl> find_context(const void* address) {
+  for (const std::shared_ptr<platform_impl>& platform : all_platforms()) {
+    const std::lock_guard lock(platform->default_context_mutex);
+    if (platform->default_context.get() == address) return platform->default_context;
+  }
   const std::lock_guard lock(objects().mutex);
   const auto found = objects().contexts.find(address);
   return found == objects().contexts.end() ? nullptr : found->second.lock();

@@ -11,7 +11,8 @@ namespace sycl::detail {
 /// info::device::mem_base_addr_align of every device: a cache line.
 inline constexpr unsigned mem_base_addr_align_bits = 512;
 
-/// The live contexts and queues by address, which is their native handle.
+/// The live queues and contexts, other than the default ones, by address, which is their native
+/// handle.
 namespace native_objects {
 void remember(const std::shared_ptr<context_impl>& object);
 void remember(const std::shared_ptr<queue_impl>& object);
