@@ -149,6 +149,16 @@ inline constexpr bool has_fma = true;
 inline constexpr bool has_fma = false;
 #endif
 
+/// Whether loops run on vectors of 512 bits with masks. These pass the divider in parts, so that a
+/// root and a division take as long as forty other operations, and a select between an operand and
+/// what is computed from it is part of that operation. Where it pays, a body has two ways to the
+/// same bits.
+#if defined(__AVX512F__)
+inline constexpr bool wide_vectors = true;
+#else
+inline constexpr bool wide_vectors = false;
+#endif
+
 template <typename T>
 LUMEN_DEVICE inline T mad(T a, T b, T c) {
   return fma(a, b, c);

@@ -20,28 +20,29 @@ template <typename Body, typename T>
 struct acos_paths : scalar_v11<Body, T> {
   LUMEN_MAIN main_result<T> main(T x) {
     const auto r = half_angle<T>::of(x);
-    return {Body::angle(x, r), flag_if<T>(is_outside_unit_interval(r.y))};
+    return {Body::angle(x, r), r.outside};
   }
 
   LUMEN_RARE std::uint32_t rare(T x, T* y) { return out_of_domain(x, y); }
 
  protected:
-  LUMEN_MAIN T base(T x, const half_angle<T>& r, uint_of<T> half, uint_of<T> whole) {
-    const T of_root = select(sign_bit(x) != 0, value(whole), T(0));
-    return select(r.direct, value(half), of_root);
+  /// For half of pi, or a word of it, all of which two are a word of pi.
+  LUMEN_MAIN T base(T x, const half_angle<T>& r, uint_of<T> half) {
+    const T none_or_twice = value(half) - value(half ^ sign_bit(x));
+    return select(!r.direct, none_or_twice, value(half));
   }
 
   LUMEN_MAIN T one_word(T x, const half_angle<T>& r, T factor) {
-    const T s = select(r.direct, x, value(bits(r.root) ^ sign_bit(x)));
-    return fma(-factor, s, base(x, r, pi_words<T>::half, pi_words<T>::whole));
+    const T v = select(!r.direct, r.root_unlike(x), x);
+    return fma(-factor, v, base(x, r, pi_words<T>::half));
   }
 
   /// The head is the rounded base - v; beside it stand its rounding error, that of the root, the
   /// second word of the base and the product with the polynomial's rest.
   LUMEN_MAIN T two_words(T x, const half_angle<T>& r) {
-    const T b = base(x, r, pi_words<T>::half, pi_words<T>::whole);
-    const T low = base(x, r, pi_words<T>::half_low, pi_words<T>::whole_low);
-    const T v = select(r.direct, -x, value(bits(-r.root) ^ sign_bit(x)));
+    const T b = base(x, r, pi_words<T>::half);
+    const T low = base(x, r, pi_words<T>::half_low);
+    const T v = select(!r.direct, r.root_like(x), -x);
     const T t = b + v;
     const T u = t - b;
     const T rest = select(r.direct, (v - u) + low, r.rest_of_root(u, low));

@@ -17,9 +17,9 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 template <typename T, tier t>
 LUMEN_MAIN T acospi_value(T x) {
   const auto r = half_angle<T>::of(x);
-  const T v = select(r.direct, -x, value(bits(-r.root) ^ sign_bit(x)));
-  const T of_root = select(sign_bit(x) != 0, T(1), T(0));
-  return base_and_arcsine_over_pi<t>(select(r.direct, T(0.5), of_root), v, r);
+  const T v = select(!r.direct, r.root_like(x), -x);
+  const T zero_or_one = T(0.5) - or_sign(T(0.5), x);
+  return base_and_arcsine_over_pi<t>(select(!r.direct, zero_or_one, T(0.5)), v, r);
 }
 
 /// acospi, float; largest error 0.64 ulp at `ha`, 3.5 in the one body of `la` and `ep`. 1 has
@@ -27,14 +27,19 @@ LUMEN_MAIN T acospi_value(T x) {
 template <tier t>
 struct acospi_s : scalar_v11<acospi_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
-    return {acospi_value<float, t>(x), flag_if<float>(fabs(x) >= 1.0f)};
+    return {acospi_value<float, t>(x), flag_if<float>(bits(fabs(x)) >= format<float>::one)};
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) {
     if (fabs(x) > 1.0f) return out_of_domain(x, y);
-    *y = x > 0 ? 0.0f : 1.0f;
+    const float number = x > 0 ? 0.0f : 1.0f;
+    *y = is_nan(x) ? nan_of(x) : number;
     return mask(code::none);
   }
+
+ private:
+  /// A NaN itself, quietened; in one word without its sign.
+  LUMEN_DEVICE static float nan_of(float x) { return t == tier::ha ? x + x : fabs(x) + fabs(x); }
 };
 
 /// acospi, double; largest error 0.69, 2.6 and 4.1e7 ulp for `ha`, `la`, `ep`. Code 1 for |x| > 1

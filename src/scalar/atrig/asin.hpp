@@ -18,7 +18,7 @@ template <typename Body, typename T>
 struct asin_paths : scalar_v11<Body, T> {
   LUMEN_MAIN main_result<T> main(T x) {
     const auto r = half_angle<T>::of(x);
-    return {or_sign(Body::magnitude(x, r), x), flag_if<T>(is_outside_unit_interval(r.y))};
+    return {or_sign(Body::magnitude(x, r), x), r.outside};
   }
 
   LUMEN_RARE std::uint32_t rare(T x, T* y) { return out_of_domain(x, y); }
@@ -26,8 +26,8 @@ struct asin_paths : scalar_v11<Body, T> {
  protected:
   /// pi/2 + s·factor for a root s, x·factor in the direct case.
   LUMEN_MAIN T one_word(T x, const half_angle<T>& r, T factor) {
-    const T s = select(r.direct, x, r.root);
-    return fma(factor, s, select(r.direct, T(0), value(pi_words<T>::half)));
+    const T beyond_half = fma(factor, r.root, value(pi_words<T>::half));
+    return select(r.direct, factor * x, beyond_half);
   }
 
   /// The sum is a head, |x| or the rounded pi/2 - 2√y, and small terms: the head's product with the

@@ -34,14 +34,16 @@ LUMEN_MAIN bool is_tiny_arcsine(T x) {
 template <tier t>
 struct asinpi_s : scalar_v11<asinpi_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
-    return {asinpi_value<float, t>(x),
-            flag_if<float>(fabs(x) >= 1.0f, t == tier::ha && is_tiny_arcsine(x))};
+    return {asinpi_value<float, t>(x), flag_if<float>(bits(fabs(x)) >= format<float>::one,
+                                                      t == tier::ha && is_tiny_arcsine(x))};
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) {
     if (fabs(x) > 1.0f) return out_of_domain(x, y);
     if (fabs(x) == 1.0f) {
       *y = or_sign(0.5f, x);
+    } else if (is_nan(x)) {
+      *y = x + x;
     } else {
       *y = static_cast<float>(static_cast<double>(x) * value(pi_words<double>::inverse));
     }

@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include "scalar/atrig/out_of_domain.hpp"
+#include "scalar/inverse_root.hpp"
 #include "scalar/protocol.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
@@ -28,8 +30,7 @@ struct pi_words<double> {
 ///     arcsin a = a Q(a²)                    for a <= 1/2, the direct case,
 ///     arcsin a = pi/2 - 2√y Q(y)            for a > 1/2, with y = (1 - a)/2, exact there.
 ///
-/// The root is y times 1/√y; an addend that is lost in every other y keeps that finite at y = 0,
-/// where the product is 0.
+/// The root is y times 1/√y, which is finite at y = 0, where the product is 0.
 template <typename T>
 struct half_angle {
   T a;
@@ -38,16 +39,23 @@ struct half_angle {
   T inverse;  ///< 1/√y
   T root;     ///< -2√y
   bool direct;
+  uint_of<T> outside;  ///< not 0 if |x| > 1, or a NaN: code 1
 
   LUMEN_MAIN half_angle of(T x) {
     const T a = fabs(x);
     const T y = fma(T(-0.5), a, T(0.5));
+    const bool direct = a <= T(0.5);
     const T square = x * x;
-    const T z = select(square < y, square, y);
-    const float seed = divide(1.0f, sqrt(static_cast<float>(y) + value(0x01800000u)));  // 2^-124
-    const auto inverse = static_cast<T>(seed);
-    return {a, y, z, inverse, root_of(y, inverse), a <= T(0.5)};
+    const T z = select(wide_vectors ? direct : square < y, square, y);
+    const auto [root, inverse] = roots(y);
+    return {a, y, z, T(inverse), root_of(y, T(inverse)), direct, is_outside(y, root)};
   }
+
+  /// 2√y with the sign of x, and with that of -x.
+  LUMEN_DEVICE float root_like(float x) const { return (or_sign(1.0f, x) - x) * inverse; }
+  LUMEN_DEVICE float root_unlike(float x) const { return (x - or_sign(1.0f, x)) * inverse; }
+  LUMEN_DEVICE double root_like(double x) const { return value(bits(-root) ^ sign_bit(x)); }
+  LUMEN_DEVICE double root_unlike(double x) const { return value(bits(root) ^ sign_bit(x)); }
 
   /// What a word `u` for 2√y or -2√y lacks, added to `low`.
   LUMEN_DEVICE T rest_of_root(T u, T low) const {
@@ -57,7 +65,16 @@ struct half_angle {
   }
 
  private:
-  LUMEN_MAIN float root_of(float y, float inverse) { return -2.0f * (y * inverse); }
+  /// √y and 1/√y. Of doubles a vector holds half as many, which the divider has time for.
+  LUMEN_MAIN root_and_inverse roots(float y) {
+    if constexpr (wide_vectors) return root_and_inverse::by_steps(y);
+    return root_and_inverse::by_division(y);
+  }
+  LUMEN_MAIN root_and_inverse roots(double y) {
+    return root_and_inverse::by_division(static_cast<float>(y));
+  }
+
+  LUMEN_MAIN float root_of(float y, float inverse) { return -2.0f * y * inverse; }
 
   /// The root from the float seed, with 1 + e/2 + 3e²/8 for its error.
   LUMEN_MAIN double root_of(double y, double inverse) {
@@ -65,6 +82,12 @@ struct half_angle {
     const double g = -2.0 * h;
     const double e = fma(-inverse, h, 1.0);
     return fma(fma(0.375, e, 0.5) * e, g, g);
+  }
+
+  /// The root of the negative number is a NaN, the roots of all others lack this bit.
+  LUMEN_MAIN std::uint32_t is_outside(float, float root) { return bits(root) & 0x40000000u; }
+  LUMEN_MAIN std::uint64_t is_outside(double y, float) {
+    return flag_if<double>(is_outside_unit_interval(y));
   }
 };
 

@@ -16,40 +16,41 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 /// +infinity, also beside a NaN.
 ///
 /// The larger operand is brought to [1/2, 1) or [2, 4), by a power of two whose inverse is normal
-/// too, so that no square overflows and none that matters underflows; one step of Newton corrects
-/// the root that the reciprocal root gives. Within 0.88, 0.97, 0.97 ulp for `ha`, `la`, `ep`: at
-/// `ha` the sum of squares is in two words.
+/// too, so that no square overflows and none that matters underflows. Within 0.88, 0.97, 0.97 ulp
+/// for `ha`, `la`, `ep`: at `ha` the sum of squares is in two words, and one step of Newton
+/// corrects the root that the reciprocal root gives. From one word such a step gives the rounded
+/// root for every sum, so that `la` and `ep` leave it to the device.
 template <tier t>
 struct hypot_s : scalar_v21<hypot_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x, float y) {
-    const float ax = fabs(x);
-    const float ay = fabs(y);
-    const float larger = select(bits(ax) > bits(ay), ax, ay);
-    const float smaller = select(bits(ax) > bits(ay), ay, ax);
-    const std::uint32_t scale = (((bits(larger) >> 6) & 0x01000000u) | 0x7e800000u) -
-                                (bits(larger) & format<float>::special);
-    const float a = fma(larger, value(scale), 0.0f);
-    const float b = fma(smaller, value(scale), 0.0f);
-    const float b2 = fma(b, b, 0.0f);
-    const float s = sum(a, b2);
-    const float r = divide(1.0f, sqrt(s));
-    const float g = fma(s, r, 0.0f);
-    const float h = fma(r, 0.5f, 0.0f);
-    float d = fma(g, -g, s);
-    if constexpr (t == tier::ha) d = d + rest_of_sum(a, b, b2, s);
-    const float z = fma(h, d, g);
-    const float root = fma(z, value(0x7f000000u - scale), 0.0f);
-    const float finite = select(s == 0, 0.0f, root);
+    const std::uint32_t ax = bits(fabs(x)), ay = bits(fabs(y));
+    const std::uint32_t larger = select(ax > ay, ax, ay);
+    const std::uint32_t smaller = select(ax > ay, ay, ax);
+    const std::uint32_t scale =
+        (((larger >> 6) & 0x01000000u) | 0x7e800000u) - (larger & format<float>::special);
+    const float a = value(larger) * value(scale);
+    const float b = value(smaller) * value(scale);
+    const float finite = root(a, b) * value(0x7f000000u - scale);
     const bool infinite_x = is_infinite(x), infinite_y = is_infinite(y);
-    const bool infinite = infinite_x | infinite_y;
-    const float special = select(infinite, value(format<float>::special), x + y);
-    return {select(is_special(larger), special, finite)};
+    const float sum = select(larger >= format<float>::special, x + y, finite);
+    return {select(infinite_x | infinite_y, value(format<float>::special), sum)};
   }
 
  private:
-  LUMEN_MAIN float sum(float a, float b2) {
-    if constexpr (t == tier::ha) return fma(a, a, 0.0f) + b2;
-    return fma(a, a, b2);
+  LUMEN_MAIN float root(float a, float b) {
+    const float b2 = fma(b, b, 0.0f);
+    if constexpr (t == tier::ha)
+      return two_word_root(a, b, b2);
+    else
+      return sqrt(fma(a, a, b2));
+  }
+
+  LUMEN_MAIN float two_word_root(float a, float b, float b2) {
+    const float s = fma(a, a, 0.0f) + b2;
+    const float r = divide(1.0f, sqrt(s));
+    const float g = fma(s, r, 0.0f);
+    const float d = fma(g, -g, s) + rest_of_sum(a, b, b2, s);
+    return select(s == 0, 0.0f, fma(r * 0.5f, d, g));
   }
 
   /// What s, the sum of the two rounded squares, leaves out.

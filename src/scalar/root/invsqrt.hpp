@@ -7,6 +7,7 @@
 
 #include "scalar/half.hpp"
 #include "scalar/horner.hpp"
+#include "scalar/inverse_root.hpp"
 #include "scalar/protocol.hpp"
 #include "scalar/root/careful_inverse_root.hpp"
 
@@ -21,7 +22,7 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 template <tier t>
 struct invsqrt_s : scalar_v11<invsqrt_s<t>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
-    const float c = divide(1.0f, sqrt(x));
+    const float c = inverse_root(x);
     return {refined(x, c), flag_if<float>(not_positive_normal(x))};
   }
 
