@@ -33,7 +33,7 @@ LUMEN_MAIN float inverse_root(float y) {
     return divide(1.0f, root);
 }
 
-/// √y and 1/√y for y = 0, where the inverse is finite, or y from 2^-100.
+/// √y and 1/√y for y = 0, where the inverse is finite, or y from 2^-99.
 struct root_and_inverse {
   float root;
   float inverse;

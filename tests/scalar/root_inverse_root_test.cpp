@@ -45,7 +45,7 @@ TEST(InverseRoot, ZeroHasAFiniteInverse) {
 
 TEST(InverseRoot, BothWaysAgree) {
   using pair = scalar::root_and_inverse;
-  for (std::uint32_t b = 0x0d800000; b < 0x3f800000; b += 4099) {  // from 2^-100
+  for (std::uint32_t b = 0x0e000000; b < 0x3f800000; b += 4099) {  // from 2^-99
     const pair division = pair::by_division(value(b)), steps = pair::by_steps(value(b));
     ASSERT_EQ(bits(division.root), bits(steps.root)) << b;
     ASSERT_EQ(bits(division.inverse), bits(steps.inverse)) << b;
