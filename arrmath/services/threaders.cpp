@@ -11,8 +11,10 @@
 
 namespace {
 
-/// Work that is worth a thread, in nanoseconds: below it waking the thread takes longer than what
-/// it saves. Measured with two threads on `sqr`, `exp` and `pow`; docs/performance has the figures.
+/// Work that is worth a thread, in nanoseconds. In calls that follow one another OpenMP's threads
+/// still spin, and two of them pay from about 5 microseconds of work in all; after a pause they have
+/// to be woken, which takes some 60 microseconds, and pay from about 200. In between, what a call
+/// gains in the one case is about what it loses in the other. arrmath/README.md has the figures.
 constexpr float work_per_thread = 20e3f;
 
 /// Threads begin at multiples of this many elements: whole blocks of the kernels, whole pages.
