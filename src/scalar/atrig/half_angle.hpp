@@ -52,13 +52,21 @@ struct half_angle {
   }
 
   /// 2√y with the sign of x, and with that of -x.
-  LUMEN_DEVICE float root_like(float x) const { return (or_sign(1.0f, x) - x) * inverse; }
-  LUMEN_DEVICE float root_unlike(float x) const { return (x - or_sign(1.0f, x)) * inverse; }
-  LUMEN_DEVICE double root_like(double x) const { return value(bits(-root) ^ sign_bit(x)); }
-  LUMEN_DEVICE double root_unlike(double x) const { return value(bits(root) ^ sign_bit(x)); }
+  [[gnu::always_inline]] LUMEN_DEVICE float root_like(float x) const {
+    return (or_sign(1.0f, x) - x) * inverse;
+  }
+  [[gnu::always_inline]] LUMEN_DEVICE float root_unlike(float x) const {
+    return (x - or_sign(1.0f, x)) * inverse;
+  }
+  [[gnu::always_inline]] LUMEN_DEVICE double root_like(double x) const {
+    return value(bits(-root) ^ sign_bit(x));
+  }
+  [[gnu::always_inline]] LUMEN_DEVICE double root_unlike(double x) const {
+    return value(bits(root) ^ sign_bit(x));
+  }
 
   /// What a word `u` for 2√y or -2√y lacks, added to `low`.
-  LUMEN_DEVICE T rest_of_root(T u, T low) const {
+  [[gnu::always_inline]] LUMEN_DEVICE T rest_of_root(T u, T low) const {
     const T w = u * T(0.5);
     const T d = fma(-w, w, y);
     return fma(value(bits(d) ^ sign_bit(u)), inverse, low);
