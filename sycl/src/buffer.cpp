@@ -42,7 +42,7 @@ void buffer_view::end() {
 }
 
 const property_list& buffer_view::properties() const noexcept {
-  return region_.storage->properties;
+  return region_.storage->properties();
 }
 
 void buffer_view::set_final_data(std::unique_ptr<final_destination> destination,
@@ -50,9 +50,12 @@ void buffer_view::set_final_data(std::unique_ptr<final_destination> destination,
   if (sub_buffer_ || element_size != region_.storage->element_size()) {
     destination_ = std::move(destination);
     element_size_ = element_size;
-    if (!sub_buffer_) region_.storage->redirect();
+    if (!sub_buffer_) region_.storage->origin().redirected = true;
   } else {
-    region_.storage->set_final_data(std::move(destination));
+    buffer_origin& origin = region_.storage->origin();
+    origin.destination = std::move(destination);
+    origin.redirected = true;
+    origin.write_back = true;
   }
   if (!sub_buffer_) region_.storage->leave_callers_memory();
 }
@@ -60,7 +63,7 @@ void buffer_view::set_final_data(std::unique_ptr<final_destination> destination,
 void buffer_view::set_write_back(bool enabled) {
   write_back_ = enabled;
   if (sub_buffer_) return;
-  region_.storage->set_write_back(enabled);
+  region_.storage->origin().write_back = enabled;
   if (!enabled) region_.storage->leave_callers_memory();
 }
 

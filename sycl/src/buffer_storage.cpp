@@ -20,94 +20,111 @@ constexpr std::align_val_t cache_line{64};
   throw exception(errc::memory_allocation, "there is no memory for the buffer");
 }
 
-std::size_t bytes_of(const buffer_description& description) {
+std::size_t bytes_of(std::size_t elements, std::size_t element_size) {
   std::size_t bytes = 0;
-  if (__builtin_mul_overflow(description.elements, description.element_size, &bytes)) {
-    throw_no_memory();
-  }
+  if (__builtin_mul_overflow(elements, element_size, &bytes)) throw_no_memory();
   return bytes;
 }
 
 }  // namespace
 
-buffer_storage::buffer_storage(const buffer_description& described,
-                               std::unique_ptr<buffer_memory> memory,
-                               const property_list& buffer_properties)
-    : properties(buffer_properties),
-      description_(described),
-      memory_(std::move(memory)),
-      data_(const_cast<void*>(description_.initial)),
-      in_place_(
-          description_.initial != nullptr &&
-          (properties.has_property<property::buffer::use_host_ptr>() ||
-           (description_.in_place && !properties.has_property<property::buffer::use_mutex>()))),
-      write_back_(description_.write_back),
-      whole_(region{this, 0, bytes_of(description_)}) {
-  if (in_place_) return;
-  allocate();
-  if (description_.initial != nullptr && bytes() != 0) {
-    const auto lock = callers_lock();
-    std::memcpy(data_, description_.initial, bytes());
-  }
+bool buffer_origin::in_place() const noexcept {
+  return description.initial != nullptr &&
+         (properties.has_property<property::buffer::use_host_ptr>() ||
+          (description.in_place && !properties.has_property<property::buffer::use_mutex>()));
 }
 
-buffer_storage::~buffer_storage() {
-  if (in_place_ || is_small_ || data_ == nullptr) return;
-  if (memory_ != nullptr) {
-    memory_->release(data_, description_.elements);
-  } else {
-    ::operator delete(data_, cache_line);
-  }
+std::unique_lock<std::mutex> buffer_origin::callers_lock() const {
+  if (!properties.has_property<property::buffer::use_mutex>()) return {};
+  return std::unique_lock(*properties.get_property<property::buffer::use_mutex>().get_mutex_ptr());
 }
 
 view_handle buffer_view::make(const buffer_description& description,
                               std::unique_ptr<buffer_memory> memory,
                               const property_list& properties) {
-  auto made = std::make_shared<buffer_storage>(description, std::move(memory), properties);
+  std::unique_ptr<buffer_origin> origin;
+  if (description.initial != nullptr || memory != nullptr || !properties.entries_.empty()) {
+    origin.reset(new buffer_origin{.description = description,
+                                   .memory = std::move(memory),
+                                   .properties = properties,
+                                   .destination = nullptr,
+                                   .write_back = description.write_back});
+  }
+  auto made = std::make_shared<buffer_storage>(description.elements, description.element_size,
+                                               std::move(origin));
   buffer_storage& storage = *made;
   storage.self_ = std::move(made);
   return view_handle(&storage.whole_);
 }
 
+buffer_storage::buffer_storage(std::size_t elements, std::size_t element_size,
+                               std::unique_ptr<buffer_origin> origin)
+    : elements_(elements),
+      element_size_(element_size),
+      origin_(std::move(origin)),
+      in_place_(origin_ != nullptr && origin_->in_place()),
+      whole_(region{this, 0, bytes_of(elements, element_size)}) {
+  const void* const initial = origin_ != nullptr ? origin_->description.initial : nullptr;
+  if (in_place_) {
+    data_ = const_cast<void*>(initial);
+    return;
+  }
+  allocate();
+  if (initial != nullptr && bytes() != 0) {
+    const auto lock = origin_->callers_lock();
+    std::memcpy(data_, initial, bytes());
+  }
+}
+
+buffer_storage::~buffer_storage() {
+  if (in_place_ || is_small_ || data_ == nullptr) return;
+  if (origin_ != nullptr && origin_->memory != nullptr) {
+    origin_->memory->release(data_, elements_);
+  } else {
+    ::operator delete(data_, cache_line);
+  }
+}
+
 void buffer_storage::close() {
   const std::shared_ptr<buffer_storage> keep = std::move(self_);
-  const bool to_caller = write_back_ && !redirected_ && modified_ && !in_place_;
-  const bool to_destination = write_back_ && destination_ != nullptr;
+  if (origin_ == nullptr) return;
+  const bool written = origin_->write_back && origin_->description.write_back;
+  const bool to_caller = written && !origin_->redirected && modified_ && !in_place_;
+  const bool to_destination = origin_->write_back && origin_->destination != nullptr;
   if (to_caller || to_destination || in_place_) wait_for_accesses(0, bytes());
   if (to_caller || to_destination) {
-    const auto lock = callers_lock();
+    const auto lock = origin_->callers_lock();
     if (to_destination) {
-      destination_->write(data_, description_.elements);
+      origin_->destination->write(data_, elements_);
     } else if (bytes() != 0) {
-      std::memcpy(const_cast<void*>(description_.initial), data_, bytes());
+      std::memcpy(const_cast<void*>(origin_->description.initial), data_, bytes());
     }
   }
-  destination_ = nullptr;
-  description_.keep_alive = nullptr;
+  origin_->destination = nullptr;
+  origin_->description.keep_alive = nullptr;
 }
 
-void buffer_storage::set_final_data(std::unique_ptr<final_destination> destination) {
-  destination_ = std::move(destination);
-  redirected_ = true;
-  write_back_ = true;
+buffer_origin& buffer_storage::origin() {
+  if (origin_ == nullptr) origin_ = std::make_unique<buffer_origin>();
+  return *origin_;
 }
 
-std::unique_lock<std::mutex> buffer_storage::callers_lock() const {
-  if (!properties.has_property<property::buffer::use_mutex>()) return {};
-  return std::unique_lock(*properties.get_property<property::buffer::use_mutex>().get_mutex_ptr());
+const property_list& buffer_storage::properties() const noexcept {
+  static const property_list none;
+  return origin_ != nullptr ? origin_->properties : none;
 }
 
 void buffer_storage::allocate() {
+  buffer_memory* const memory = origin_ != nullptr ? origin_->memory.get() : nullptr;
   data_ = nullptr;
-  if (bytes() != 0 && bytes() <= small && memory_ == nullptr) {
+  if (bytes() != 0 && bytes() <= small && memory == nullptr) {
     std::size_t space = sizeof small_;
     data_ = small_;
     data_ = std::align(small, bytes(), data_, space);
     is_small_ = true;
-  } else if (description_.elements != 0) {
+  } else if (elements_ != 0) {
     try {
-      data_ = memory_ != nullptr ? memory_->allocate(description_.elements)
-                                 : ::operator new(bytes(), cache_line);
+      data_ = memory != nullptr ? memory->allocate(elements_) : ::operator new(bytes(), cache_line);
     } catch (const std::bad_alloc&) {
       throw_no_memory();
     }
@@ -116,7 +133,9 @@ void buffer_storage::allocate() {
 }
 
 void buffer_storage::leave_callers_memory() {
-  if (!in_place_ || accessed_ || properties.has_property<property::buffer::use_host_ptr>()) return;
+  if (!in_place_ || accessed_ || properties().has_property<property::buffer::use_host_ptr>()) {
+    return;
+  }
   const void* const initial = data_;
   allocate();
   if (bytes() != 0) std::memcpy(data_, initial, bytes());

@@ -12,13 +12,31 @@
 
 namespace sycl::detail {
 
+/// What a buffer has beside its memory, unless it began as uninitialised memory of the default
+/// allocator and nothing was said of its contents.
+struct buffer_origin {
+  /// The buffer works in the memory that it was given.
+  bool in_place() const noexcept;
+  /// Keeps the mutex of property::buffer::use_mutex, if there is one.
+  std::unique_lock<std::mutex> callers_lock() const;
+
+  buffer_description description;
+  std::unique_ptr<buffer_memory> memory;
+  property_list properties;
+  std::unique_ptr<final_destination> destination;
+  /// The contents do not go to the caller's memory any more.
+  bool redirected = false;
+  bool write_back = false;
+};
+
 /// What all views of a buffer share: its memory, the accesses to it that are not complete, and what
 /// becomes of the contents. It lives until the last view is gone and the last command that uses it
 /// is complete; until then the view of the whole buffer owns it.
 class buffer_storage {
  public:
-  buffer_storage(const buffer_description& description, std::unique_ptr<buffer_memory> memory,
-                 const property_list& properties);
+  /// A null origin stands for an empty one.
+  buffer_storage(std::size_t elements, std::size_t element_size,
+                 std::unique_ptr<buffer_origin> origin);
   ~buffer_storage();
   buffer_storage(const buffer_storage&) = delete;
   buffer_storage& operator=(const buffer_storage&) = delete;
@@ -29,10 +47,8 @@ class buffer_storage {
   /// The contents go where they belong. Memory of the buffer's own that goes nowhere is left to
   /// the commands that still use it.
   void close();
-  void set_final_data(std::unique_ptr<final_destination> destination);
-  /// The contents do not go to the caller's memory any more.
-  void redirect() noexcept { redirected_ = true; }
-  void set_write_back(bool enabled) noexcept { write_back_ = enabled; }
+  buffer_origin& origin();
+  const property_list& properties() const noexcept;
 
   /// Guards the lists of accesses of all storages.
   static spin_mutex& accesses_mutex() noexcept;
@@ -45,9 +61,7 @@ class buffer_storage {
   void leave_callers_memory();
 
   void* data() const noexcept { return data_; }
-  std::size_t element_size() const noexcept { return description_.element_size; }
-
-  const property_list properties;
+  std::size_t element_size() const noexcept { return element_size_; }
 
   /// Some accessor has been made, one that writes if `write`.
   void note_access(bool write) noexcept {
@@ -60,21 +74,17 @@ class buffer_storage {
 
   std::size_t bytes() const noexcept { return whole_.size(); }
   void allocate();
-  /// Keeps the mutex of property::buffer::use_mutex, if there is one.
-  std::unique_lock<std::mutex> callers_lock() const;
 
   /// Room for a buffer of a few elements, which then costs no allocation, aligned like any other.
   static constexpr std::size_t small = 64;
   alignas(std::max_align_t) std::byte small_[2 * small];
   bool is_small_ = false;
 
-  buffer_description description_;
-  std::unique_ptr<buffer_memory> memory_;
-  void* data_;
+  std::size_t elements_;
+  std::size_t element_size_;
+  std::unique_ptr<buffer_origin> origin_;
+  void* data_ = nullptr;
   bool in_place_;
-  bool redirected_ = false;
-  bool write_back_;
-  std::unique_ptr<final_destination> destination_;
   std::atomic<bool> accessed_{false};
   std::atomic<bool> modified_{false};
   access_record* first_ = nullptr;

@@ -131,9 +131,9 @@ void require_region(handler& cgh, const region& bytes, access_mode mode) {
                                        " (info::device::mem_base_addr_align)");
   }
   buffer_storage& storage = *bytes.storage;
-  if (storage.properties.has_property<property::buffer::context_bound>()) {
+  if (storage.properties().has_property<property::buffer::context_bound>()) {
     const context bound =
-        storage.properties.get_property<property::buffer::context_bound>().get_context();
+        storage.properties().get_property<property::buffer::context_bound>().get_context();
     if (handle_access::impl(bound)->identity() != cgh.owner_->ctx->identity()) {
       throw exception(errc::invalid, "the buffer is bound to another context");
     }

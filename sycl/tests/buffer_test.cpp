@@ -197,6 +197,18 @@ TEST(Buffer, WriteBackCanBeTurnedOffAndOn) {
   EXPECT_EQ(v, std::vector<int>(6, 2));
 }
 
+TEST(Buffer, ForcedWriteBackNeedsMemoryThatMayBeWrittenTo) {
+  const std::vector<int> constant(6, 1);
+  {
+    buffer<int> copied(constant.data(), range<1>(6)), plain(range<1>(6));
+    for (buffer<int>* buf : {&copied, &plain}) {
+      add_one(*buf);
+      buf->set_write_back(true);
+    }
+  }
+  EXPECT_EQ(constant, std::vector<int>(6, 1));
+}
+
 TEST(Buffer, HoldsTheMutexWhileItTouchesTheCallersMemory) {
   std::vector<int> v(6, 1);
   std::mutex m;

@@ -68,6 +68,8 @@ inline constexpr property::no_init no_init{};
 
 namespace detail {
 
+class buffer_view;
+
 /// The properties by number: the number of a type is the same in every module of a program.
 enum class property_number : int {
   none,
@@ -140,6 +142,8 @@ class property_list {
   }
 
  private:
+  friend class detail::buffer_view;
+
   struct entry {
     detail::property_number number;
     std::shared_ptr<void> value;
