@@ -19,6 +19,8 @@ std::atomic<Word>& queue_words<Word>::look_up(std::uint64_t key) {
 template class queue_words<std::uint32_t>;
 template class queue_words<std::uint64_t>;
 
+queue_store::queue_store() = default;
+
 queue_store& queue_store::instance() {
   static queue_store store;
   // A level of 0 doubles as the mark that nothing was read, so it alone is read again.

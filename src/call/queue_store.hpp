@@ -82,7 +82,7 @@ class queue_store {
   void set_saved_callback(lumen_arr_error_callback callback);
 
  private:
-  queue_store() = default;
+  [[gnu::noinline]] queue_store();  // keeps instance() short
   void read_verbosity();
 
   std::mutex mutex_;

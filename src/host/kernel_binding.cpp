@@ -90,18 +90,15 @@ std::int32_t processor_type() {
   return type;
 }
 
-std::int32_t kernel_binding::resolve() {
-  constexpr auto relaxed = std::memory_order_relaxed;
-  if (ttab.load(relaxed) == nullptr)
-    ttab.store(static_cast<const lumen_arr_kernel*>(find_symbol(ttab_name)), relaxed);
-  if (ctab.load(relaxed) == nullptr)
-    ctab.store(static_cast<const float*>(find_symbol(ctab_name)), relaxed);
-  auto index_of = get_index.load(relaxed);
-  if (index_of == nullptr) {
-    index_of = find_function<decltype(index_of)>("lumen_arr_kernel_GetTTableIndex");
-    get_index.store(index_of, relaxed);
-  }
-  return index_of(processor_type());
+lumen_arr_kernel kernel_binding::resolve() {
+  const auto* const ttab = static_cast<const lumen_arr_kernel*>(find_symbol(ttab_name));
+  const auto* const ctab = static_cast<const float*>(find_symbol(ctab_name));
+  const auto index_of =
+      find_function<decltype(&lumen_arr_kernel_GetTTableIndex)>("lumen_arr_kernel_GetTTableIndex");
+  const std::int32_t index = index_of(processor_type());
+  cost.store(ctab[index], std::memory_order_relaxed);
+  kernel.store(ttab[index], std::memory_order_release);
+  return ttab[index];
 }
 
 void kernel_binding::reject_length() const {

@@ -37,18 +37,21 @@ void* find_symbol(const char* name);
 /// variable LUMEN_ARR_DEBUG_CPU_TYPE, a number from 0 to 9 but not 8, decides if it is set.
 std::int32_t processor_type();
 
-/// One kernel with its name in messages. Its tables are found on first use, without a lock: every
-/// thread would store the same addresses.
+/// One kernel with its name in messages. Its entries in the tables are found on first use, without
+/// a lock: every thread would store the same ones.
 struct kernel_binding {
   const char* name;
   const char* ttab_name;
   const char* ctab_name;
-  std::atomic<const lumen_arr_kernel*> ttab{nullptr};
-  std::atomic<const float*> ctab{nullptr};
-  std::atomic<decltype(&lumen_arr_kernel_GetTTableIndex)> get_index{nullptr};
+  std::atomic<lumen_arr_kernel> kernel{nullptr};  ///< set last
+  std::atomic<float> cost{0};
 
-  /// Finds what has not been found yet. @returns the index of this processor in the tables
-  std::int32_t resolve();
+  /// The kernel for this processor.
+  lumen_arr_kernel resolved() {
+    const lumen_arr_kernel found = kernel.load(std::memory_order_acquire);
+    return found != nullptr ? found : resolve();
+  }
+  lumen_arr_kernel resolve();
   /// Reports a negative number of elements.
   void reject_length() const;
   /// Reports a null pointer at `position`.
@@ -128,12 +131,11 @@ void run(kernel_binding& binding, Threader* threader, std::int64_t n, std::int64
   if (n == 0) return;
   if (const std::int64_t position = null_position(operands...); position != 0)
     return binding.reject_null(position);
-  const std::int32_t index = binding.resolve();
+  using entry = typename first_parameter<Threader>::type;
+  const auto kernel = reinterpret_cast<entry>(binding.resolved());
+  const float cost = binding.cost.load(std::memory_order_relaxed);
   void* const module = arr_module();
   const scoped_mode guard(mode);
-  using entry = typename first_parameter<Threader>::type;
-  const auto kernel = reinterpret_cast<entry>(binding.ttab.load()[index]);
-  const float cost = binding.ctab.load()[index];
   constexpr std::int64_t longest = 0x7fffffff;
   std::int64_t done = 0;
   for (; n - done > longest; done += longest)
