@@ -26,11 +26,7 @@ view_handle buffer_view::reinterpretation() {
   return view_handle(new buffer_view(whole(), region_, sub_buffer_));
 }
 
-view_handle buffer_view::whole() {
-  if (whole_.get() != nullptr) return whole_;
-  handles_.fetch_add(1, std::memory_order_relaxed);
-  return view_handle(this);
-}
+view_handle buffer_view::whole() { return whole_.get() != nullptr ? whole_ : share(); }
 
 void buffer_view::end() {
   if (whole_.get() == nullptr) return region_.storage->close();

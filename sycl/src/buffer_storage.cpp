@@ -50,8 +50,21 @@ view_handle buffer_view::make(const buffer_description& description,
                                    .destination = nullptr,
                                    .write_back = description.write_back});
   }
-  auto made = std::make_shared<buffer_storage>(description.elements, description.element_size,
-                                               std::move(origin));
+  return buffer_storage::make(description.elements, description.element_size, std::move(origin));
+}
+
+buffer_view* deferred_view::make() const {
+  view_handle made = buffer_storage::make(elements_, element_size_, nullptr);
+  buffer_view* before = nullptr;
+  if (view_.compare_exchange_strong(before, made.get(), std::memory_order_acq_rel)) {
+    return made.release();
+  }
+  return before;
+}
+
+view_handle buffer_storage::make(std::size_t elements, std::size_t element_size,
+                                 std::unique_ptr<buffer_origin> origin) {
+  auto made = std::make_shared<buffer_storage>(elements, element_size, std::move(origin));
   buffer_storage& storage = *made;
   storage.self_ = std::move(made);
   return view_handle(&storage.whole_);

@@ -71,12 +71,17 @@ class buffer_storage {
 
  private:
   friend class buffer_view;
+  friend class deferred_view;
+
+  /// The view of the whole of a new storage.
+  static view_handle make(std::size_t elements, std::size_t element_size,
+                          std::unique_ptr<buffer_origin> origin);
 
   std::size_t bytes() const noexcept { return whole_.size(); }
   void allocate();
 
   /// Room for a buffer of a few elements, which then costs no allocation, aligned like any other.
-  static constexpr std::size_t small = 64;
+  static constexpr std::size_t small = deferred_view::small;
   alignas(std::max_align_t) std::byte small_[2 * small];
   bool is_small_ = false;
 

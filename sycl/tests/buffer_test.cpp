@@ -258,6 +258,50 @@ TEST(Buffer, CopiesAreTheSameBufferAndOthersAreNot) {
   EXPECT_EQ(sycl::host_accessor(third)[1], 9);
 }
 
+int& element(buffer<int>& buf, std::size_t i) {
+  const sycl::host_accessor elements(buf);
+  return elements[i];
+}
+
+TEST(Buffer, SharesAStorageThatIsMadeLater) {
+  buffer<int> untouched(range<1>(1)), other(range<1>(1));
+  EXPECT_EQ(untouched, untouched);
+  EXPECT_NE(untouched, other);
+  buffer<int> copy = untouched;
+  EXPECT_EQ(untouched, copy);
+  EXPECT_NE(copy, other);
+  EXPECT_EQ(std::hash<buffer<int>>()(untouched), std::hash<buffer<int>>()(copy));
+  element(copy, 0) = 7;
+  EXPECT_EQ(element(untouched, 0), 7);
+  copy = other;
+  EXPECT_EQ(copy, other);
+  buffer<int> moved = std::move(other);
+  EXPECT_EQ(copy, moved);
+  moved = buffer<int>(range<1>(2));
+  EXPECT_NE(copy, moved);
+  EXPECT_EQ(moved.size(), 2U);
+  element(moved, 1) = 3;
+  EXPECT_EQ(element(moved, 1), 3);
+}
+
+TEST(Buffer, CopiesMadeAtTheSameTimeShareAStorage) {
+  for (int round = 0; round < 200; ++round) {
+    const buffer<int> original(range<1>(1));
+    std::atomic<int> ready{0};
+    std::vector<buffer<int>> copies(2, buffer<int>(range<1>(1)));
+    const auto copy = [&](int i) {
+      for (++ready; ready < 2;) {
+      }
+      copies[i] = original;
+    };
+    std::thread first(copy, 0), second(copy, 1);
+    first.join();
+    second.join();
+    ASSERT_EQ(copies[0], original);
+    ASSERT_EQ(copies[1], original);
+  }
+}
+
 TEST(Buffer, ReinterpretsItsBytes) {
   buffer<std::uint32_t> buf(range<1>(6));
   { buf.get_host_access()[1] = 0x01020304; }

@@ -63,10 +63,14 @@ class allocator_memory final : public buffer_memory {
   AllocatorT allocator_;
 };
 
+template <typename T, typename AllocatorT>
+inline constexpr bool is_default_allocator =
+    alignof(T) <= 64 && std::is_same_v<AllocatorT, aligned_allocator<T>>;
+
 /// Null for the default allocator.
 template <typename T, typename AllocatorT>
 std::unique_ptr<buffer_memory> memory_of(const AllocatorT& allocator) {
-  if constexpr (alignof(T) <= 64 && std::is_same_v<AllocatorT, aligned_allocator<T>>) {
+  if constexpr (is_default_allocator<T, AllocatorT>) {
     return nullptr;
   } else {
     return std::make_unique<allocator_memory<T, AllocatorT>>(allocator);
@@ -133,7 +137,7 @@ class buffer {
   using allocator_type = AllocatorT;
 
   buffer(const range<Dimensions>& extents, const property_list& properties = {})
-      : buffer(extents, AllocatorT(), properties) {}
+      : view_(plain_view(extents, properties)), range_(extents) {}
   buffer(const range<Dimensions>& extents, AllocatorT allocator,
          const property_list& properties = {})
       : buffer(extents, std::move(allocator), properties, {}) {}
@@ -241,7 +245,7 @@ class buffer {
   }
   void set_write_back(bool enabled = true) { view_->set_write_back(enabled); }
 
-  bool is_sub_buffer() const noexcept { return view_->is_sub_buffer(); }
+  bool is_sub_buffer() const { return view_->is_sub_buffer(); }
 
   template <typename ReinterpretT, int ReinterpretDim>
   auto reinterpret(range<ReinterpretDim> extents) const {
@@ -276,7 +280,7 @@ class buffer {
   }
 
   /// The untyped buffer, for the runtime.
-  const detail::buffer_view& view() const noexcept { return *view_; }
+  const detail::buffer_view& view() const { return *view_; }
 
   friend bool operator==(const buffer& a, const buffer& b) noexcept { return a.view_ == b.view_; }
 
@@ -294,23 +298,44 @@ class buffer {
 
   buffer(const range<Dimensions>& extents, AllocatorT allocator, const property_list& properties,
          detail::buffer_description description)
-      : range_(extents), allocator_(std::move(allocator)) {
-    using plain_allocator =
-        typename std::allocator_traits<AllocatorT>::template rebind_alloc<plain>;
-    description.elements = extents.size();
-    description.element_size = sizeof(T);
-    view_ = detail::buffer_view::make(
-        description, detail::memory_of<plain>(plain_allocator(allocator_)), properties);
-  }
+      : view_(make_view(extents, allocator, properties, std::move(description))),
+        range_(extents),
+        allocator_(std::move(allocator)) {}
   buffer(const std::vector<element>& contents, AllocatorT allocator,
          const property_list& properties)
       : buffer(range<1>(contents.size()), std::move(allocator), properties,
                {.initial = contents.data(), .keep_alive = {}}) {}
-  buffer(detail::view_handle view, const range<Dimensions>& extents, AllocatorT allocator)
+  buffer(detail::deferred_view view, const range<Dimensions>& extents, AllocatorT allocator)
       : view_(std::move(view)), range_(extents), allocator_(std::move(allocator)) {}
 
-  static detail::view_handle sub_view(const buffer& parent, const id<Dimensions>& base_index,
-                                      const range<Dimensions>& extents) {
+  static detail::deferred_view make_view(const range<Dimensions>& extents,
+                                         const AllocatorT& allocator,
+                                         const property_list& properties,
+                                         detail::buffer_description description) {
+    using plain_allocator =
+        typename std::allocator_traits<AllocatorT>::template rebind_alloc<plain>;
+    description.elements = extents.size();
+    description.element_size = sizeof(T);
+    return detail::buffer_view::make(
+        description, detail::memory_of<plain>(plain_allocator(allocator)), properties);
+  }
+
+  /// Of uninitialised memory from a default-constructed allocator.
+  static detail::deferred_view plain_view(const range<Dimensions>& extents,
+                                          const property_list& properties) {
+    if constexpr (detail::is_default_allocator<plain, AllocatorT>) {
+      // Few elements first: the bytes of many may be more than can be counted.
+      const std::size_t elements = extents.size();
+      if (elements <= detail::deferred_view::small &&
+          detail::deferred_view::may_defer(elements * sizeof(T), properties)) {
+        return {elements, sizeof(T)};
+      }
+    }
+    return make_view(extents, AllocatorT(), properties, {});
+  }
+
+  static detail::deferred_view sub_view(const buffer& parent, const id<Dimensions>& base_index,
+                                        const range<Dimensions>& extents) {
     if (parent.is_sub_buffer()) {
       detail::throw_error(errc::invalid, "a sub-buffer cannot be made of a sub-buffer");
     }
@@ -329,7 +354,7 @@ class buffer {
     return parent.view_->part(first * sizeof(T), extents.size() * sizeof(T));
   }
 
-  detail::view_handle view_;
+  detail::deferred_view view_;
   range<Dimensions> range_;
   AllocatorT allocator_{};
 };

@@ -69,6 +69,7 @@ inline constexpr property::no_init no_init{};
 namespace detail {
 
 class buffer_view;
+class deferred_view;
 
 /// The properties by number: the number of a type is the same in every module of a program.
 enum class property_number : int {
@@ -143,6 +144,7 @@ class property_list {
 
  private:
   friend class detail::buffer_view;
+  friend class detail::deferred_view;
 
   struct entry {
     detail::property_number number;

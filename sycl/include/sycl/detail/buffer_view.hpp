@@ -58,8 +58,8 @@ class view_handle {
   ~view_handle();
 
   buffer_view* get() const noexcept { return view_; }
-  buffer_view* operator->() const noexcept { return view_; }
-  buffer_view& operator*() const noexcept { return *view_; }
+  /// The view with its count, for another owner.
+  buffer_view* release() noexcept { return std::exchange(view_, nullptr); }
 
   friend bool operator==(const view_handle& a, const view_handle& b) noexcept = default;
 
@@ -77,6 +77,11 @@ class ARBOR_LUMEN_SYCL_API buffer_view {
   /// A null `memory` stands for the default allocator's.
   static view_handle make(const buffer_description& description,
                           std::unique_ptr<buffer_memory> memory, const property_list& properties);
+  /// One more handle on this view.
+  view_handle share() noexcept {
+    handles_.fetch_add(1, std::memory_order_relaxed);
+    return view_handle(this);
+  }
   /// A part of this view, which starts `offset` bytes into it.
   view_handle part(std::size_t offset, std::size_t bytes);
   /// All of this view, as elements of another type.
@@ -114,9 +119,8 @@ class ARBOR_LUMEN_SYCL_API buffer_view {
   bool write_back_ = true;
 };
 
-inline view_handle::view_handle(const view_handle& other) noexcept : view_(other.view_) {
-  if (view_ != nullptr) view_->handles_.fetch_add(1, std::memory_order_relaxed);
-}
+inline view_handle::view_handle(const view_handle& other) noexcept
+    : view_(other.view_ != nullptr ? other.view_->share().release() : nullptr) {}
 
 inline view_handle::~view_handle() {
   // Nobody can copy the only handle meanwhile, so it needs no counting down.
@@ -125,5 +129,59 @@ inline view_handle::~view_handle() {
     view_->end();
   }
 }
+
+/// A buffer's handle on its view. That of a small buffer without contents or properties is made
+/// when something first asks for it: of many such buffers, like the status of a call that reports
+/// nothing, nobody ever does.
+class deferred_view {
+ public:
+  deferred_view() noexcept = default;
+  deferred_view(view_handle made) noexcept : view_(made.release()) {}
+  deferred_view(std::size_t elements, std::size_t element_size) noexcept
+      : elements_(elements), element_size_(element_size) {}
+  /// Whether the view of a buffer without contents may wait.
+  static bool may_defer(std::size_t bytes, const property_list& properties) noexcept {
+    return bytes <= small && properties.entries_.empty();
+  }
+  /// Makes the view of `other`, which the copy shares.
+  deferred_view(const deferred_view& other) : deferred_view(other->share()) {}
+  deferred_view(deferred_view&& other) noexcept
+      : view_(other.view_.load(std::memory_order_relaxed)),
+        elements_(other.elements_),
+        element_size_(other.element_size_) {
+    other.view_.store(nullptr, std::memory_order_relaxed);
+  }
+  deferred_view& operator=(deferred_view other) noexcept {
+    buffer_view* const before = view_.load(std::memory_order_relaxed);
+    view_.store(other.view_.load(std::memory_order_relaxed), std::memory_order_relaxed);
+    other.view_.store(before, std::memory_order_relaxed);
+    elements_ = other.elements_;
+    element_size_ = other.element_size_;
+    return *this;
+  }
+  ~deferred_view() { view_handle(view_.load(std::memory_order_relaxed)); }
+
+  buffer_view* get() const {
+    buffer_view* const made = view_.load(std::memory_order_acquire);
+    return made != nullptr ? made : make();
+  }
+  buffer_view* operator->() const { return get(); }
+  buffer_view& operator*() const { return *get(); }
+
+  friend bool operator==(const deferred_view& a, const deferred_view& b) noexcept {
+    const buffer_view* const made = a.view_.load(std::memory_order_relaxed);
+    return made == nullptr ? &a == &b : made == b.view_.load(std::memory_order_relaxed);
+  }
+
+  /// The most bytes of such a buffer.
+  static constexpr std::size_t small = 64;
+
+ private:
+  ARBOR_LUMEN_SYCL_API buffer_view* make() const;
+
+  mutable std::atomic<buffer_view*> view_{nullptr};
+  std::size_t elements_ = 0;
+  std::size_t element_size_ = 0;
+};
 
 }  // namespace sycl::detail
