@@ -41,16 +41,21 @@ inline constexpr std::uint64_t precision_of_pair =
     precision_of<T> < precision_of<U> ? precision_of<U> : precision_of<T>;
 
 /// A caller's error handler as a call keeps it: a copy, so that no reference to the caller's object
-/// outlives the exported function's argument list.
+/// outlives the exported function's argument list. Of one that is not enabled nothing is taken: it
+/// does nothing, and to share its buffer would cost every call.
 template <typename T>
 class error_handler_x final : public error_handler<T> {
  public:
   /// Does nothing. Kernels on buffers write to the handler's buffer also where it reports nothing,
   /// so that every call needs one of its own.
   error_handler_x() = default;
-  explicit error_handler_x(const error_handler<T>& handler) : error_handler<T>(handler) {}
+  explicit error_handler_x(const error_handler<T>& handler) { *this = handler; }
   error_handler_x& operator=(const error_handler<T>& handler) {
-    error_handler<T>::operator=(handler);
+    if (handler.enabled) {
+      error_handler<T>::operator=(handler);
+    } else {
+      this->enabled = false;
+    }
     return *this;
   }
 };

@@ -4,6 +4,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 #include <sycl/sycl.hpp>
 
 namespace arbor::lumen::vm::detail {
@@ -22,18 +23,21 @@ constexpr std::uint64_t fnv(std::uint64_t value) {
 /// agree in all three share one entry, also one after the other. A null queue has key 0.
 std::uint64_t queue_key(const sycl::queue* queue);
 
-/// A caller's queue with its key, which is worked out once.
+/// A caller's queue with its device and its key, which are worked out once.
 class keyed_queue {
  public:
   keyed_queue() = default;
-  keyed_queue(sycl::queue* queue) : queue_(queue), key_(queue_key(queue)) {}
+  keyed_queue(sycl::queue* queue);
 
   operator sycl::queue*() const { return queue_; }
   std::uint64_t key() const { return key_; }
+  /// The device of a queue that is not null.
+  const sycl::device& device() const { return *device_; }
 
  private:
   sycl::queue* queue_ = nullptr;
   std::uint64_t key_ = 0;
+  std::optional<sycl::device> device_;
 };
 
 }  // namespace arbor::lumen::vm::detail

@@ -34,7 +34,7 @@ std::uint64_t classify(const sycl::device& device) {
 }
 
 std::uint64_t of_queue(const keyed_queue& queue) {
-  const std::uint64_t word = classify((*queue).get_device());
+  const std::uint64_t word = classify(queue.device());
   queue_store::instance().record_device_word(queue.key(), word);
   return word;
 }

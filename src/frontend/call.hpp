@@ -34,7 +34,7 @@ class call<input::record<Form, Shape, T, U>> {
   }
 
   call& after(const std::vector<sycl::event>& depends) {
-    record_.depends = std::vector<sycl::event>(depends);
+    if (!depends.empty()) record_.depends = std::vector<sycl::event>(depends);
     return *this;
   }
 

@@ -75,7 +75,7 @@ class staged_arguments {
  public:
   template <typename InCount, typename OutCount>
   staged_arguments(const input::typed_vxx<T, U>& record, InCount in_count, OutCount out_count) {
-    const host::staging_queue on(*record.queue);
+    const host::staging_queue on(record.queue);
     for (std::size_t k = 0; k < Shape::inputs; ++k)
       args_.in[k] = inputs_[k].wrap(on, record.in_pointer(k), in_count(k));
     for (std::size_t j = 0; j < Shape::outputs; ++j)

@@ -7,12 +7,14 @@
 #include <cstdint>
 #include <sycl/sycl.hpp>
 
+#include "call/queue_key.hpp"
+
 namespace arbor::lumen::vm::detail::host {
 
 /// The queue of a call and what its arrays need to know of it.
 struct staging_queue {
-  explicit staging_queue(sycl::queue& callers)
-      : queue(callers), is_cpu(callers.get_device().is_cpu()) {}
+  explicit staging_queue(const keyed_queue& callers)
+      : queue(*callers), is_cpu(callers.device().is_cpu()) {}
   sycl::queue& queue;
   bool is_cpu;
 };

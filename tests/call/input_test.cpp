@@ -276,4 +276,16 @@ TEST_F(Input, HandlerOfACallIsACopy) {
   EXPECT_EQ(enums::underflow, cells[0]);
 }
 
+TEST_F(Input, NothingIsTakenOfAHandlerThatIsNotEnabled) {
+  error_handler<double> callers(3.0, arbor::lumen::vm::enums::sing);
+  error_handler_x<double> own(callers);
+  EXPECT_TRUE(own.enabled);
+  callers.enabled = false;
+  own = callers;
+  EXPECT_FALSE(own.enabled);
+  const error_handler_x<double> other(callers);
+  EXPECT_FALSE(other.enabled);
+  EXPECT_FALSE(other.status_buffer == callers.status_buffer);
+}
+
 }  // namespace

@@ -130,7 +130,7 @@ TEST_F(HostStaging, EarlierCopiesGoWhereALaterOneFails) {
   const void* first = nullptr;
   EXPECT_EQ(message_of<arbor::lumen::invalid_argument>([&] {
               namespace host = arbor::lumen::vm::detail::host;
-              const host::staging_queue on(gpu_);
+              const host::staging_queue on(&gpu_);
               host::usm_wrapper<float> one, other;
               float* const copy = one.wrap(on, a.data(), 3, true);
               first = copy;
