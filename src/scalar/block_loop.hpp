@@ -96,6 +96,9 @@ class block_loop {
   || requires(T x, U* y) { Body::rare(x, y, y); }
   || requires(T x, U* y) { Body::rare(x, x, y); };
 
+  static constexpr bool has_beyond = requires(T x) { Body::beyond(x); }
+  || requires(T x) { Body::beyond(x, x); };
+
   static std::uint32_t rare(const T* a, [[maybe_unused]] const T* b, U* y, [[maybe_unused]] U* z,
                             std::int64_t i) {
     const T x = load(a + i);
@@ -166,9 +169,9 @@ class block_loop {
     flag flags[length];
     std::uint32_t status = 0;
     for (std::int64_t i = 0; i < count; ++i) flags[i] = main(a, b, i).rare;
-    if constexpr (requires(T x) { Body::beyond(x); }) {
+    if constexpr (has_beyond) {
       if (count == length && length - std::count(flags, flags + length, 0) > length / 8)
-        beyond(a, y, flags);
+        status |= beyond(a, b, y, flags);
     }
     for (std::int64_t i = 0; i < count; ++i) {
       if (flags[i] != 0) status |= rare(a, b, y, z, i);
@@ -177,16 +180,26 @@ class block_loop {
   }
 
   /// The second main path for the flagged elements; leaves the flags of those it does not serve.
-  [[gnu::noinline]] static void beyond(const T* __restrict a, U* __restrict y,
-                                       flag* __restrict flags) {
+  [[gnu::noinline]] static std::uint32_t beyond(const T* __restrict a,
+                                                [[maybe_unused]] const T* __restrict b,
+                                                U* __restrict y, flag* __restrict flags) {
     [[maybe_unused]] constexpr int in_flight = 2;
+    flag status = 0;
     LUMEN_BLOCK_LOOP
     for (std::int64_t i = 0; i < length; ++i) {
-      const auto result = Body::beyond(load(a + i));
+      const auto result = [&] {
+        if constexpr (Inputs == 2)
+          return Body::beyond(load(a + i), load(b + i));
+        else
+          return Body::beyond(load(a + i));
+      }();
       const bool served = flags[i] == 0;
       store(y + i, select(served, load(y + i), result.value));
       flags[i] = select(served, flag{0}, result.rare);
+      if constexpr (requires { result.status; })
+        status |= select(served || result.rare != 0, flag{0}, result.status);
     }
+    return static_cast<std::uint32_t>(status);
   }
 
   /// Elements that are apart, fewer than a block, or written over an input: through local blocks.

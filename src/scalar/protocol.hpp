@@ -10,7 +10,8 @@
 /// fast everywhere: on a GPU the rare path is a branch that lanes seldom take, on a CPU the
 /// compiler vectorises `main` by itself. A body whose rare path many arguments in a row may take
 /// adds `beyond`, which is for flagged arguments what `main` is for all: the same results as `rare`
-/// without a branch, or a flag. A body that a processor computes faster in another way, such as
+/// without a branch, or a flag. It returns a `main_result` if what it serves has status 0, else a
+/// `rare_result`. A body that a processor computes faster in another way, such as
 /// floats in doubles, adds `block` for a number of elements at once: the same results and status 0,
 /// or false, after which `main` computes them. Only loops over arrays use these two.
 ///
@@ -77,6 +78,22 @@ struct main_result2 {
   U second;
   typename rare_flag<U>::type rare = 0;
 };
+
+/// What `beyond` gives for an argument that may have a status: the value, whether `rare` is needed
+/// all the same, and the status mask.
+template <typename U>
+struct rare_result {
+  U value;
+  typename rare_flag<U>::type rare = 0;
+  typename rare_flag<U>::type status = 0;
+};
+
+/// For a `rare` that is no more than its `beyond`.
+template <typename U>
+LUMEN_DEVICE inline std::uint32_t assign(const rare_result<U>& result, U* y) {
+  *y = result.value;
+  return static_cast<std::uint32_t>(result.status);
+}
 
 /// How a loop reads and writes elements: a complex one by its parts. Copied as a whole, a complex
 /// float is one 64-bit value to the compiler, which then does not vectorise the loop.

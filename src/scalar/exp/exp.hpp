@@ -21,6 +21,7 @@ struct natural_base_s {
                                  c1 = 0x3f800000;
   static constexpr std::uint32_t normal_limit = 0x42aeac4f;  // 87.33654
   static constexpr std::uint32_t scaled_limit = 0x432eac4f;  // 174.67308
+  static constexpr std::uint32_t zero_limit = 0x42d00000;    // 104: e^-104 < 2^-150
 };
 
 /// exp, float; within 0.86 ulp in every tier.
@@ -122,22 +123,24 @@ struct exp_d : scalar_v11<exp_d<t>, double> {
     return {fma(scale, e.rest, scale), flag_if<double>(is_large(x))};
   }
 
-  LUMEN_RARE std::uint32_t rare(double x, double* y) {
-    double result;
-    if ((bits(fabs(x)) >> 32) < 0x40879127u) {  // 754.144
-      const factors e = factorize(x);
-      const bool down = x >= 0;
-      const double scale = value(e.scale + (down ? 0xf800000000000000u : 0x0800000000000000u));
-      const double back = value(down ? 0x47f0000000000000u : 0x37f0000000000000u);  // 2^±128
-      result = fma(scale, e.rest, scale) * back;
-    } else if (is_nan(x)) {
-      result = x + 0.0;
-    } else {
-      result = x >= 0 ? value(format<double>::special) : 0.0;
-    }
-    *y = result;
-    if (result < value(0x0010000000000000u)) return mask(code::underflow);
-    return mask(result == value(format<double>::special) ? code::overflow : code::none);
+  LUMEN_RARE std::uint32_t rare(double x, double* y) { return assign(beyond(x), y); }
+
+  /// A zero is not computed: processors take long for a product that underflows.
+  LUMEN_MAIN rare_result<double> beyond(double x) {
+    const double infinity = value(format<double>::special);
+    const bool computed = (bits(fabs(x)) >> 32) < 0x40879127u && !(x < -746.0);  // 754.144
+    const factors e = factorize(select(computed, x, 0.0));
+    const bool down = x >= 0;
+    const double scale = value(e.scale + select(down, std::uint64_t{0xf800000000000000},
+                                                std::uint64_t{0x0800000000000000}));
+    const double back = select(down, 0x1p128, 0x1p-128);
+    const double power = fma(scale, e.rest, scale) * back;
+    const double limit = select(is_nan(x), x + 0.0, select(down, infinity, 0.0));
+    const double result = select(computed, power, limit);
+    const std::uint64_t above = select(result == infinity, mask(code::overflow), 0u);
+    return {
+        result, 0,
+        select(result < value(0x0010000000000000u), std::uint64_t{mask(code::underflow)}, above)};
   }
 
  private:

@@ -22,6 +22,7 @@ struct decimal_base_s {
                                  c1 = 0x40135d8e;
   static constexpr std::uint32_t normal_limit = 0x4217b818;  // 37.92978
   static constexpr std::uint32_t scaled_limit = 0x42349e35;  // 45.1545
+  static constexpr std::uint32_t zero_limit = scaled_limit;
 };
 
 /// exp10, float; within 0.95 ulp in every tier.
@@ -42,24 +43,28 @@ struct exp10_d : scalar_v11<exp10_d<t>, double> {
   }
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
+    const rare_result<double> limit = beyond(x);
+    if (limit.rare == 0) return assign(limit, y);
     const std::uint64_t exponent_field = (bits(x) >> 52) & 0x7ff;
     if (exponent_field == 0x7ff) {
-      *y = bits(x) == 0xfff0000000000000u ? 0.0 : x * x;
+      *y = x * x;
       return mask(code::none);
     }
     if (exponent_field <= 0x3ca) {
       *y = 1.0 + x;
       return mask(code::none);
     }
-    if (x > value(0x40734413509f79feu)) {
-      *y = value(format<double>::special);
-      return mask(code::overflow);
-    }
-    if (x < value(0xc07439b746e36b52u)) {  // -323.60724533877976
-      *y = 0.0;
-      return mask(code::underflow);
-    }
     return finite_power(x, y);
+  }
+
+  /// Infinity and zero.
+  LUMEN_MAIN rare_result<double> beyond(double x) {
+    const bool above = x > value(0x40734413509f79feu);
+    const bool below = x < value(0xc07439b746e36b52u);  // -323.60724533877976
+    const std::uint64_t status =
+        select(above, std::uint64_t{mask(code::overflow)}, std::uint64_t{mask(code::underflow)});
+    return {select(above, value(format<double>::special), 0.0), flag_if<double>(!(above || below)),
+            select(is_special(x), std::uint64_t{0}, status)};
   }
 
  private:

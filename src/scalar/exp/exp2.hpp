@@ -13,9 +13,19 @@ namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
 /// The status of a power of two of a finite argument, by its pattern.
 template <typename T>
-LUMEN_DEVICE inline std::uint32_t exp2_status(T result) {
-  if (bits(result) <= format<T>::fraction) return mask(code::underflow);
-  return mask(bits(result) == format<T>::special ? code::overflow : code::none);
+LUMEN_MAIN uint_of<T> exp2_status(T result) {
+  const uint_of<T> above = select(bits(result) == format<T>::special, mask(code::overflow), 0u);
+  return select(bits(result) <= format<T>::fraction, uint_of<T>{mask(code::underflow)}, above);
+}
+
+/// What `beyond` gives for 2^x: `power` where the argument is finite and the power is not zero.
+/// A zero is not computed: processors take long for a product that underflows.
+template <typename T>
+LUMEN_MAIN rare_result<T> exp2_result(T x, bool is_zero, T power) {
+  const T finite = select(is_zero, T(0), power);
+  const T special = select(x < 0, T(0), x + x);
+  return {select(is_special(x), special, finite), 0,
+          select(is_special(x), uint_of<T>{0}, exp2_status(finite))};
 }
 
 /// 2^f at float for |f| <= 1/2, as (1 + f/2) + e: the main part is kept in two words, so that its
@@ -41,21 +51,22 @@ struct exp2_s : scalar_v11<exp2_s, float> {
     return {value(bits(y) + (i << 23)), flag_if<float>(i - 127u < 0xffffff04u)};
   }
 
-  LUMEN_RARE std::uint32_t rare(float x, float* y) {
-    if (is_special(x)) {
-      *y = bits(x) == 0xff800000u ? 0.0f : x + x;
-      return mask(code::none);
-    }
-    const float c = select(x < -192.0f, -192.0f, select(x > 192.0f, 192.0f, x));
+  LUMEN_RARE std::uint32_t rare(float x, float* y) { return assign(beyond(x), y); }
+
+  LUMEN_MAIN rare_result<float> beyond(float x) {
+    const bool is_zero = x < -151.0f;
+    const float finite = select(is_special(x) || is_zero, 0.0f, x);
+    const float c = select(finite > 192.0f, 192.0f, finite);
     const auto k = static_cast<std::int32_t>(rint(c));
     const std::int32_t a = k >> 1;
     const std::int32_t b = k - a;
-    *y = (exp2_of_fraction(x - rint(x)) * power_of_two(b)) * power_of_two(a);
-    return exp2_status(*y);
+    const float fraction = finite - rint(finite);
+    const float power = (exp2_of_fraction(fraction) * power_of_two(b)) * power_of_two(a);
+    return exp2_result(x, is_zero, power);
   }
 
  private:
-  LUMEN_DEVICE static float power_of_two(std::int32_t e) {
+  LUMEN_MAIN float power_of_two(std::int32_t e) {
     return value((static_cast<std::uint32_t>(e) << 23) + format<float>::one);
   }
 };
@@ -72,23 +83,21 @@ struct exp2_d : scalar_v11<exp2_d<t>, double> {
     return {a.power * value(a.shifted << 52), flag_if<double>(fabs(x) >= 1022.0)};
   }
 
-  LUMEN_RARE std::uint32_t rare(double x, double* y) {
-    if (is_special(x)) {
-      *y = bits(x) == 0xfff0000000000000u ? 0.0 : x + x;
-      return mask(code::none);
-    }
-    const reduced a = reduce(x);
+  LUMEN_RARE std::uint32_t rare(double x, double* y) { return assign(beyond(x), y); }
+
+  LUMEN_MAIN rare_result<double> beyond(double x) {
+    const bool is_zero = x < -1076.0;
+    const reduced a = reduce(select(is_special(x) || is_zero, 0.0, x));
     // The integer of the reduction and not that of x anew: a shifter of other parity would send an
     // argument halfway between two integers to the other one.
-    const double n =
-        select(a.integer < -1536.0, -1536.0, select(a.integer > 1536.0, 1536.0, a.integer));
+    const double n = select(a.integer > 1536.0, 1536.0, a.integer);
     const std::uint64_t u = bits(n + value(0x43380000000007feu)) & 0xffffffffu;  // n + 2046
     // Beyond 2^51 the sum with the shifter is no longer exact, and the fraction means nothing.
-    const double power = select(a.power < 0.5, 0.5, select(a.power > 2.0, 2.0, a.power));
+    const double fraction = select(a.power < 0.5, 0.5, select(a.power > 2.0, 2.0, a.power));
     const std::uint64_t first = u >> 1;
     const std::uint64_t second = u - first;
-    *y = (power * value(second << 52)) * value(first << 52);
-    return exp2_status(*y);
+    const double power = (fraction * value(second << 52)) * value(first << 52);
+    return exp2_result(x, is_zero, power);
   }
 
  private:

@@ -37,20 +37,22 @@ struct expm1_s_paths : scalar_v11<Body, float> {
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) {
-    if (x < 0) {
-      *y = -1.0f;
-      return mask(code::none);
-    }
-    if (x < 128.0f) {
-      *y = Body::scaled_power(x) * value(0x5f800000u);  // 2^64
-      return mask(is_infinite(*y) ? code::overflow : code::none);
-    }
+    const rare_result<float> limit = beyond(x);
+    if (limit.rare == 0) return assign(limit, y);
     if (is_nan(x)) {
       *y = x + or_sign(Body::difference(x), x);
       return mask(code::none);
     }
-    *y = value(format<float>::special);
-    return mask(code::overflow);
+    *y = Body::scaled_power(x) * value(0x5f800000u);  // 2^64
+    return mask(is_infinite(*y) ? code::overflow : code::none);
+  }
+
+  /// -1 and infinity.
+  LUMEN_MAIN rare_result<float> beyond(float x) {
+    const bool below = x < 0;
+    const bool above = x >= 128.0f;
+    return {select(below, -1.0f, value(format<float>::special)), flag_if<float>(!(below || above)),
+            select(above, mask(code::overflow), 0u)};
   }
 
  protected:
@@ -167,21 +169,23 @@ struct expm1_d_paths : scalar_v11<Body, double> {
   }
 
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
-    const auto narrowed = static_cast<float>(x);
-    if (narrowed < 0) {
-      *y = -1.0;
-      return mask(code::none);
-    }
-    if (narrowed < 1024.0f) {
-      *y = Body::scaled_power(x) * value(0x5ff0000000000000u);  // 2^512
-      return mask(is_infinite(*y) ? code::overflow : code::none);
-    }
+    const rare_result<double> limit = beyond(x);
+    if (limit.rare == 0) return assign(limit, y);
     if (is_nan(x)) {
       *y = Body::difference(x) + x;
       return mask(code::none);
     }
-    *y = value(format<double>::special);
-    return mask(code::overflow);
+    *y = Body::scaled_power(x) * value(0x5ff0000000000000u);  // 2^512
+    return mask(is_infinite(*y) ? code::overflow : code::none);
+  }
+
+  /// -1 and infinity.
+  LUMEN_MAIN rare_result<double> beyond(double x) {
+    const auto narrowed = static_cast<float>(x);
+    const bool below = narrowed < 0;
+    const bool above = narrowed >= 1024.0f;
+    return {select(below, -1.0, value(format<double>::special)), flag_if<double>(!(below || above)),
+            select(above, std::uint64_t{mask(code::overflow)}, std::uint64_t{0})};
   }
 
  protected:

@@ -39,7 +39,7 @@ struct half_step_factors {
   }
 
   /// The power with the scale in two factors: it may be an infinity, a denormal or zero.
-  LUMEN_DEVICE static float scaled_power(const half_step_factors& a) {
+  LUMEN_MAIN float scaled_power(const half_step_factors& a) {
     const std::uint32_t twice_biased = a.shifted + 0xfe;
     const std::uint32_t first = (twice_biased << 21) & format<float>::special;
     const float second = value(((twice_biased << 22) - first) ^ a.root);
@@ -75,7 +75,8 @@ struct half_step_factors {
 ///
 /// Up to `Base::normal_limit` the result is a normal number. From there to `Base::scaled_limit` the
 /// scale is applied in two factors, and the status stays 0 although the result may be an infinity,
-/// a denormal or zero. Beyond, and at infinities: +infinity with code 3, +0 with code 4.
+/// a denormal or zero; below minus `Base::zero_limit` it is zero. Beyond, and at infinities:
+/// +infinity with code 3, +0 with code 4.
 template <typename Base>
 struct half_step_power : scalar_v11<half_step_power<Base>, float> {
   using factors = half_step_factors<Base>;
@@ -84,17 +85,17 @@ struct half_step_power : scalar_v11<half_step_power<Base>, float> {
     return {factors::power(factors::of(x)), flag_if<float>(bits(fabs(x)) > Base::normal_limit)};
   }
 
-  LUMEN_RARE std::uint32_t rare(float x, float* y) {
-    if (bits(fabs(x)) <= Base::scaled_limit) {
-      *y = factors::scaled_power(factors::of(x));
-      return mask(code::none);
-    }
-    if (is_nan(x)) {
-      *y = x + x;
-      return mask(code::none);
-    }
-    *y = x < 0 ? 0.0f : value(format<float>::special);
-    return mask(x < 0 ? code::underflow : code::overflow);
+  LUMEN_RARE std::uint32_t rare(float x, float* y) { return assign(beyond(x), y); }
+
+  /// A zero is not computed: processors take long for a product that underflows.
+  LUMEN_MAIN rare_result<float> beyond(float x) {
+    const bool scaled = bits(fabs(x)) <= Base::scaled_limit;
+    const bool computed = scaled && !(x < -value(Base::zero_limit));
+    const float power = factors::scaled_power(factors::of(select(computed, x, 0.0f)));
+    const float limit = select(x < 0, 0.0f, value(format<float>::special));
+    const std::uint32_t limits_status = select(x < 0, mask(code::underflow), mask(code::overflow));
+    return {select(computed, power, select(is_nan(x), x + x, limit)), 0,
+            select(scaled || is_nan(x), mask(code::none), limits_status)};
   }
 };
 

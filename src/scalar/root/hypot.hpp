@@ -94,6 +94,8 @@ struct hypot_d : scalar_v21<hypot_d, double> {
     }
     return mask(code::none);
   }
+
+  LUMEN_MAIN main_result<double> beyond(double x, double y) { return normal_hypot(x, y); }
 };
 
 /// hypot, half: the float body of `ep` in every tier.
