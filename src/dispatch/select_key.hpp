@@ -48,7 +48,6 @@ enum class search_pass { ascending, descending, host };
 template <typename Accept>
 std::uint64_t climb(search_pass pass, int first, int last, const candidate_list& candidates,
                     Accept&& accept) {
-  if (candidates.size() == 0) return 0;
   const int direction = first <= last ? 1 : -1;
   for (int step = first; step != last + direction; step += direction) {
     for (const std::uint64_t candidate : candidates) {

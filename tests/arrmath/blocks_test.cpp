@@ -12,6 +12,7 @@
 #include <limits>
 #include <random>
 #include <string>
+#include <tuple>
 #include <vector>
 
 #include "functor.hpp"
@@ -28,13 +29,15 @@ struct block_kernel {
 };
 void PrintTo(const block_kernel& k, std::ostream* out) { *out << k.name; }
 
-/// A kernel on arrays of `T` beside the functor, under every class that this machine is of but the
-/// baseline, which has no fma and no such blocks.
+/// A kernel on arrays of `T` beside the functor, under the classes that this machine is of. The
+/// baseline, class 0, has no fma: it is slow, and left out where `first_class` is 1.
 template <typename T>
 class compared_kernel {
  public:
-  compared_kernel(const block_kernel& k, std::int64_t mode)
-      : functor_(accuracy::find_functor(k.functor)), table_(ttab(k.name)) {
+  compared_kernel(const block_kernel& k, std::int64_t mode, int first_class)
+      : functor_(accuracy::find_functor(k.functor)),
+        table_(ttab(k.name)),
+        first_class_(first_class) {
     state_.set_mode(mode);
   }
 
@@ -66,7 +69,7 @@ class compared_kernel {
     std::uint32_t all = 0;
     for (const std::uint32_t s : status_) all |= s;
     const auto classes = static_cast<int>(arbor::lumen::arr::own_processor_class()) + 1;
-    for (int c = 1; c < classes; ++c) {
+    for (int c = first_class_; c < classes; ++c) {
       state_.clear_status();
       run(table_[c], static_cast<std::int32_t>(n));
       ASSERT_EQ(static_cast<std::uint32_t>(state_.get_status()), all) << "class " << c;
@@ -79,6 +82,7 @@ class compared_kernel {
 
   const accuracy::functor* functor_;
   const lumen_arr_kernel* table_;
+  int first_class_;
   arr_state state_;
   std::vector<T> expected_, y_;
   std::vector<std::uint32_t> status_;
@@ -87,8 +91,8 @@ class compared_kernel {
 class FloatBlocks : public ::testing::TestWithParam<block_kernel> {
  public:
   /// Every `step`-th float, both signs.
-  void expect_bits(std::uint64_t step) {
-    compared_kernel<float> kernel(GetParam(), LUMEN_ARR_HA);
+  void expect_bits(std::uint64_t step, int first_class = 1) {
+    compared_kernel<float> kernel(GetParam(), LUMEN_ARR_HA, first_class);
     constexpr std::size_t n = 1 << 16;
     std::vector<float> x(n);
     for (std::uint64_t first = 0; first < std::uint64_t{1} << 32; first += n * step) {
@@ -102,6 +106,7 @@ class FloatBlocks : public ::testing::TestWithParam<block_kernel> {
 };
 
 TEST_P(FloatBlocks, HaveTheBitsOfTheFunctor) { expect_bits(251); }
+TEST_P(FloatBlocks, HaveTheBitsOfTheFunctorInTheBaselineToo) { expect_bits(65521, 0); }
 
 class SlowFloatBlocks : public FloatBlocks {};
 TEST_P(SlowFloatBlocks, HaveTheBitsOfTheFunctorForEveryFloat) { expect_bits(1); }
@@ -116,77 +121,82 @@ INSTANTIATE_TEST_SUITE_P(All, FloatBlocks, ::testing::ValuesIn(kernels),
 INSTANTIATE_TEST_SUITE_P(All, SlowFloatBlocks, ::testing::ValuesIn(kernels),
                          [](const auto& tested) { return std::string(tested.param.name); });
 
-/// A kernel on doubles with the magnitude from which on its results leave the normal numbers.
-struct limited_kernel {
-  block_kernel kernel;
-  std::int64_t mode;
+/// A family of functors of doubles with its kernel, and the magnitude from which on its results
+/// leave the normal numbers.
+struct limited_family {
+  const char* kernel;
+  const char* name;
   double limit;
 };
-void PrintTo(const limited_kernel& k, std::ostream* out) { PrintTo(k.kernel, out); }
+struct named_mode {
+  const char* tier;
+  std::int64_t mode;
+};
 
-class DoubleBlocks : public ::testing::TestWithParam<limited_kernel> {};
+class DoubleBlocks : public ::testing::TestWithParam<std::tuple<limited_family, named_mode>> {
+ public:
+  static std::string functor_name(const ParamType& tested) {
+    return std::string(std::get<0>(tested).name) + "_d_" + std::get<1>(tested).tier + "_gen";
+  }
+
+ protected:
+  const double limit_ = std::get<0>(GetParam()).limit;
+  const std::string functor_ = functor_name(GetParam());
+  compared_kernel<double> compared_{
+      {std::get<0>(GetParam()).kernel, functor_.c_str()}, std::get<1>(GetParam()).mode, 0};
+};
 
 TEST_P(DoubleBlocks, HaveTheBitsOfTheFunctorWhereResultsAreNotNormal) {
-  const auto& [kernel, mode, limit] = GetParam();
-  compared_kernel<double> compared(kernel, mode);
   std::mt19937_64 generator(1);
   std::vector<double> x(1 << 14);
   // Both sides of the limit, and where all results are zero or infinite; then magnitudes of all
   // kinds.
   for (const double sign : {-1.0, 1.0}) {
     for (const double to : {1.08, 1.2, 1e3}) {
-      std::uniform_real_distribution<double> magnitude(0.999 * limit, to * limit);
+      std::uniform_real_distribution<double> magnitude(0.999 * limit_, to * limit_);
       for (double& element : x) element = sign * magnitude(generator);
-      ASSERT_NO_FATAL_FAILURE(compared.expect_bits(x));
+      ASSERT_NO_FATAL_FAILURE(compared_.expect_bits(x));
     }
   }
   // Which operand's payload a NaN of two NaNs gets is the compiler's choice.
   for (double& element : x) {
     const std::uint64_t pattern = generator();
     std::memcpy(&element, &pattern, sizeof pattern);
-    if (std::isnan(element)) element = limit;
+    if (std::isnan(element)) element = limit_;
   }
-  ASSERT_NO_FATAL_FAILURE(compared.expect_bits(x));
+  ASSERT_NO_FATAL_FAILURE(compared_.expect_bits(x));
 }
 
 TEST_P(DoubleBlocks, HaveTheBitsOfTheFunctorForSpecialNumbers) {
-  const auto& [kernel, mode, limit] = GetParam();
-  compared_kernel<double> compared(kernel, mode);
   using limits = std::numeric_limits<double>;
   const double special[] = {limits::infinity(),     -limits::infinity(), limits::quiet_NaN(),
                             -limits::quiet_NaN(),   limits::max(),       limits::lowest(),
                             limits::signaling_NaN()};
   for (const double all : special) {
-    ASSERT_NO_FATAL_FAILURE(compared.expect_bits(std::vector<double>(1024, all)));
+    ASSERT_NO_FATAL_FAILURE(compared_.expect_bits(std::vector<double>(1024, all)));
     // Among arguments of ordinary results.
     std::vector<double> mixed(1024);
     for (std::size_t i = 0; i < mixed.size(); ++i)
-      mixed[i] = i % 3 == 0 ? all : limit * (static_cast<double>(i % 97) / 64 - 0.75);
-    ASSERT_NO_FATAL_FAILURE(compared.expect_bits(mixed));
+      mixed[i] = i % 3 == 0 ? all : limit_ * (static_cast<double>(i % 97) / 64 - 0.75);
+    ASSERT_NO_FATAL_FAILURE(compared_.expect_bits(mixed));
   }
 }
 
-constexpr limited_kernel limited_kernels[] = {
-    {{"dExp", "exp_d_ha_gen"}, LUMEN_ARR_HA, 708.0},
-    {{"dExp", "exp_d_la_gen"}, LUMEN_ARR_LA, 708.0},
-    {{"dExp", "exp_d_ep_gen"}, LUMEN_ARR_EP, 708.0},
-    {{"dExp2", "exp2_d_ha_gen"}, LUMEN_ARR_HA, 1022.0},
-    {{"dExp2", "exp2_d_la_gen"}, LUMEN_ARR_LA, 1022.0},
-    {{"dExp2", "exp2_d_ep_gen"}, LUMEN_ARR_EP, 1022.0},
-    {{"dExp10", "exp10_d_ha_gen"}, LUMEN_ARR_HA, 307.6},
-    {{"dExp10", "exp10_d_la_gen"}, LUMEN_ARR_LA, 307.6},
-    {{"dExp10", "exp10_d_ep_gen"}, LUMEN_ARR_EP, 307.6},
-    {{"dExpm1", "expm1_d_ha_gen"}, LUMEN_ARR_HA, 708.0},
-    {{"dExpm1", "expm1_d_la_gen"}, LUMEN_ARR_LA, 708.0},
-    {{"dExpm1", "expm1_d_ep_gen"}, LUMEN_ARR_EP, 708.0},
-};
-INSTANTIATE_TEST_SUITE_P(All, DoubleBlocks, ::testing::ValuesIn(limited_kernels),
+constexpr limited_family limited_families[] = {{"dExp", "exp", 708.0},
+                                               {"dExp2", "exp2", 1022.0},
+                                               {"dExp10", "exp10", 307.6},
+                                               {"dExpm1", "expm1", 708.0}};
+constexpr named_mode named_modes[] = {
+    {"ha", LUMEN_ARR_HA}, {"la", LUMEN_ARR_LA}, {"ep", LUMEN_ARR_EP}};
+INSTANTIATE_TEST_SUITE_P(All, DoubleBlocks,
+                         ::testing::Combine(::testing::ValuesIn(limited_families),
+                                            ::testing::ValuesIn(named_modes)),
                          [](const auto& tested) {
-                           return std::string(tested.param.kernel.functor);
+                           return DoubleBlocks::functor_name(tested.param);
                          });
 
 TEST(HypotBlocks, HaveTheBitsOfTheFunctorForNumbersOfAllSizes) {
-  compared_kernel<double> compared({"dHypot", "hypot_d_ha_gen"}, LUMEN_ARR_HA);
+  compared_kernel<double> compared({"dHypot", "hypot_d_ha_gen"}, LUMEN_ARR_HA, 0);
   std::mt19937_64 generator(1);
   std::vector<double> a(1 << 14), b(a.size());
   std::uniform_real_distribution<double> fraction(-2, 2);

@@ -22,7 +22,7 @@ struct decimal_base_s {
                                  c1 = 0x40135d8e;
   static constexpr std::uint32_t normal_limit = 0x4217b818;  // 37.92978
   static constexpr std::uint32_t scaled_limit = 0x42349e35;  // 45.1545
-  static constexpr std::uint32_t zero_limit = scaled_limit;
+  static constexpr std::uint32_t zero_limit = scaled_limit;  // scaled ones need not be zero
 };
 
 /// exp10, float; within 0.95 ulp in every tier.
@@ -45,12 +45,11 @@ struct exp10_d : scalar_v11<exp10_d<t>, double> {
   LUMEN_RARE std::uint32_t rare(double x, double* y) {
     const rare_result<double> limit = beyond(x);
     if (limit.rare == 0) return assign(limit, y);
-    const std::uint64_t exponent_field = (bits(x) >> 52) & 0x7ff;
-    if (exponent_field == 0x7ff) {
+    if (is_nan(x)) {
       *y = x * x;
       return mask(code::none);
     }
-    if (exponent_field <= 0x3ca) {
+    if (((bits(x) >> 52) & 0x7ff) <= 0x3ca) {
       *y = 1.0 + x;
       return mask(code::none);
     }

@@ -12,17 +12,18 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// The root of a sum of squares from 1 to below 8, in two words, over 2^quarter.
+/// The root of a sum of squares from 1 to below 8, in two words; half of it if the sum is
+/// quartered.
 struct hypot_root {
   double_double words;
-  int quarter;
+  bool quartered;
 
-  /// s, the sum over 4^quarter, is below 4. A row of the table gives T close to 1/sqrt(s) and its
-  /// square, both short; e = 1 - T²s, |e| < 2^-6, and sqrt(s) = Ts·(1 - e)^(-1/2) by the series to
-  /// degree 9, the product Ts in two words.
+  /// s, the sum or a quarter of it, is below 4. A row of the table gives T close to 1/sqrt(s) and
+  /// its square, both short; e = 1 - T²s, |e| < 2^-6, and sqrt(s) = Ts·(1 - e)^(-1/2) by the series
+  /// to degree 9, the product Ts in two words.
   LUMEN_MAIN hypot_root of(double_double sum) {
-    const bool quarter = sum.high >= 4.0;
-    const double unit = select(quarter, 0.25, 1.0);
+    const bool quartered = sum.high >= 4.0;
+    const double unit = select(quartered, 0.25, 1.0);
     const double_double s = {sum.high * unit, sum.low * unit};
     // The lowest bit of the exponent, which is 1 from 1 to 2, and seven bits of the fraction.
     const auto row = static_cast<std::int32_t>((bits(s.high) >> 45) & 0xff) ^ 0x80;
@@ -35,7 +36,7 @@ struct hypot_root {
                             0x3fd4000000000000u, 0x3fd8000000000000u, 0x3fe0000000000000u);
     const double_double product = two_product(t, s.high);
     const double rest = fma(product.high, e * p, fma(t, s.low, product.low));
-    return {fast_two_sum(product.high, rest), quarter ? 1 : 0};
+    return {fast_two_sum(product.high, rest), quartered};
   }
 };
 
@@ -44,7 +45,7 @@ struct hypot_root {
 LUMEN_DEVICE inline double careful_hypot(double a, double b) {
   const scaled_sum squares = scaled_sum_of_squares(a, b);
   const hypot_root root = hypot_root::of(squares.sum);
-  return scaled_back(root.words, squares.exponent + root.quarter);
+  return scaled_back(root.words, squares.exponent + (root.quartered ? 1 : 0));
 }
 
 /// The same of any numbers without a branch, or a flag: for denormals, infinities and NaNs, and
@@ -63,11 +64,12 @@ LUMEN_MAIN main_result<double> normal_hypot(double a, double b) {
   const double scaled = select(smaller == 0, 0.0, n * scale);
   const double_double sum = sum_of_products(two_product(m, m), two_product(scaled, scaled));
   const hypot_root root = hypot_root::of(fast_two_sum(sum.high, sum.low));
-  const std::uint64_t exponent = (larger & format<double>::special) - format<double>::one;
-  const std::uint64_t quarter = select(root.quarter != 0, std::uint64_t{1}, std::uint64_t{0});
-  const std::uint64_t too_large = format<double>::special - (std::uint64_t{1} << fraction_bits);
+  constexpr std::uint64_t twice = std::uint64_t{1} << fraction_bits;
+  const std::uint64_t exponent = (larger & format<double>::special) - format<double>::one +
+                                 select(root.quartered, twice, std::uint64_t{0});
+  constexpr std::uint64_t too_large = format<double>::special - twice;
   constexpr std::uint64_t denormals = format<double>::fraction;
-  const double result = value(bits(root.words.high) + exponent + (quarter << fraction_bits));
+  const double result = value(bits(root.words.high) + exponent);
   return {select(larger == 0, 0.0, result),
           flag_if<double>(larger - 1 < denormals, smaller - 1 < denormals, larger >= too_large)};
 }

@@ -324,11 +324,8 @@ class buffer {
   static detail::deferred_view plain_view(const range<Dimensions>& extents,
                                           const property_list& properties) {
     if constexpr (detail::is_default_allocator<plain, AllocatorT>) {
-      // Few elements first: the bytes of many may be more than can be counted.
-      const std::size_t elements = extents.size();
-      if (elements <= detail::deferred_view::small &&
-          detail::deferred_view::may_defer(elements * sizeof(T), properties)) {
-        return {elements, sizeof(T)};
+      if (detail::deferred_view::may_defer(extents.size(), sizeof(T), properties)) {
+        return {extents.size(), sizeof(T)};
       }
     }
     return make_view(extents, AllocatorT(), properties, {});

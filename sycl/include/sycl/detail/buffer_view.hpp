@@ -135,13 +135,14 @@ inline view_handle::~view_handle() {
 /// nothing, nobody ever does.
 class deferred_view {
  public:
-  deferred_view() noexcept = default;
   deferred_view(view_handle made) noexcept : view_(made.release()) {}
   deferred_view(std::size_t elements, std::size_t element_size) noexcept
       : elements_(elements), element_size_(element_size) {}
-  /// Whether the view of a buffer without contents may wait.
-  static bool may_defer(std::size_t bytes, const property_list& properties) noexcept {
-    return bytes <= small && properties.entries_.empty();
+  /// Whether the view of a buffer without contents may wait. The bytes of many elements may be more
+  /// than can be counted.
+  static bool may_defer(std::size_t elements, std::size_t element_size,
+                        const property_list& properties) noexcept {
+    return elements <= small && elements * element_size <= small && properties.entries_.empty();
   }
   /// Makes the view of `other`, which the copy shares.
   deferred_view(const deferred_view& other) : deferred_view(other->share()) {}
