@@ -120,7 +120,9 @@ class block_loop {
         return 0;
     }
     [[maybe_unused]] constexpr int in_flight = Length == length ? interleave<Body>() : 1;
-    flag flags = 0;
+    // Without a rare path the flags are the status.
+    using flags_type = std::conditional_t<has_rare, loop_flag<U>, flag>;
+    flags_type flags = 0;
     LUMEN_BLOCK_LOOP
     for (std::int64_t i = 0; i < Length; ++i) {
       const auto result = main(a, b, i);
@@ -130,7 +132,7 @@ class block_loop {
         store(y + i, result.first);
         store(z + i, result.second);
       }
-      flags |= result.rare;
+      flags |= static_cast<flags_type>(result.rare);
     }
     if constexpr (has_rare) {
       if (flags != 0) [[unlikely]]

@@ -22,6 +22,7 @@
 
 #include <complex>
 #include <cstdint>
+#include <type_traits>
 
 #include "scalar/ops.hpp"
 
@@ -62,6 +63,11 @@ LUMEN_DEVICE constexpr typename rare_flag<T>::type flag_if(Conditions... conditi
   using flag = typename rare_flag<T>::type;
   return (static_cast<flag>(conditions) | ...);
 }
+
+/// A flag as loops over elements of type `T` or it together: vectors with mask registers keep it
+/// there.
+template <typename T>
+using loop_flag = std::conditional_t<wide_vectors, bool, typename rare_flag<T>::type>;
 
 /// The value of a main path, and whether the rare path holds instead (non-zero: it does); without a
 /// rare path the status mask.

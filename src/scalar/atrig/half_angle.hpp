@@ -93,7 +93,10 @@ struct half_angle {
   }
 
   /// The root of the negative number is a NaN, the roots of all others lack this bit.
-  LUMEN_MAIN std::uint32_t is_outside(float, float root) { return bits(root) & 0x40000000u; }
+  LUMEN_MAIN std::uint32_t is_outside(float, float root) {
+    if constexpr (wide_vectors) return flag_if<float>(root != root);
+    return bits(root) & 0x40000000u;
+  }
   LUMEN_MAIN std::uint64_t is_outside(double y, float) {
     return flag_if<double>(is_outside_unit_interval(y));
   }

@@ -11,8 +11,10 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// An integer below 2^52 as a double, without a conversion from 64 bits.
+/// An integer below 2^52 as a double, without a conversion from 64 bits where there is none of
+/// whole vectors.
 LUMEN_MAIN double small_integer(std::uint64_t n) {
+  if constexpr (wide_vectors) return static_cast<double>(static_cast<std::int64_t>(n));
   return value(n | 0x4330000000000000u) - value(0x4330000000000000u);  // 2^52
 }
 
@@ -29,7 +31,7 @@ LUMEN_MAIN bool not_positive_normal(float x) {
   return static_cast<std::int32_t>(bits(x) + 0x00800000u) < 0x01000000;
 }
 LUMEN_MAIN bool not_positive_normal(double x) {
-  return is_outside(x, 0x0010000000000000u, 0x7fefffffffffffffu);
+  return static_cast<std::int64_t>(bits(x) + 0x0010000000000000u) < 0x0020000000000000;
 }
 
 /// x = 2^k·(1 + r) with 1 + r in [2/3, 4/3); r is exact.

@@ -58,11 +58,11 @@ struct fixed_turn_block {
     return ((bits(y) + (reach - middle)) & (behind & ~(2 * reach - 1))) == 0;
   }
 
-  /// A flag for loops to or together. Two bits of it are set: processors with mask registers then
-  /// or under the mask, where a single bit would first be moved into place.
+  /// A flag for loops to or together. As an integer it has two bits: those are anded into place,
+  /// where a compiler shifts a single one.
   template <typename T>
-  LUMEN_MAIN uint_of<T> mark_if(bool condition) {
-    return select(condition, uint_of<T>{3}, uint_of<T>{0});
+  LUMEN_MAIN loop_flag<T> mark_if(bool condition) {
+    return select(condition, static_cast<loop_flag<T>>(3), loop_flag<T>{0});
   }
 
  private:

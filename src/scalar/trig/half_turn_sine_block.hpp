@@ -23,7 +23,7 @@ struct half_turn_sine_block : private fixed_turn_block {
       t[i] = value(bits(cut(r, differ_in_sign(r, a))) ^ (bits(shifted) << 63));
       u[i] = static_cast<float>(t[i]);
     }
-    std::uint32_t unserved = 0;
+    loop_flag<float> unserved = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
       unserved |= mark_if<float>(is_above_fixed_turn(x[i]));
       u[i] = polynomial(u[i]);
@@ -42,9 +42,10 @@ struct half_turn_sine_block : private fixed_turn_block {
       t[i] = value(bits(cut(r, r < 0)) ^ (~bits(shifted) << 63));
       u[i] = static_cast<float>(t[i]);
     }
-    std::uint32_t unserved = 0;
+    loop_flag<float> unserved = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
-      unserved |= mark_if<float>(is_above_fixed_turn(x[i])) | mark_if<float>(is_short_of_one(x[i]));
+      unserved |= mark_if<float>(is_above_fixed_turn(x[i]));
+      unserved |= mark_if<float>(is_short_of_one(x[i]));
       u[i] = polynomial(u[i]);
     }
     return round_sines<Length>(t, u, y) && unserved == 0;
@@ -67,16 +68,16 @@ struct half_turn_sine_block : private fixed_turn_block {
   /// lie apart from y.
   template <std::int64_t Length>
   [[gnu::always_inline]] static inline bool round_sines(const double* t, const float* p, float* y) {
-    std::uint64_t unserved = 0;
+    loop_flag<double> near_middle = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
       const double v = t[i] * t[i];
       const double c2 = fma(static_cast<double>(p[i]), v, coefficient(0xc0a55de7u, 0xb39e345au));
       const double c1 = fma(c2, v, coefficient(0x40490fdbu, 0xb3bbe1b6u));
       const double sine = c1 * t[i];
       y[i] = static_cast<float>(sine);
-      unserved |= mark_if<double>(is_near_middle(sine));
+      near_middle |= mark_if<double>(is_near_middle(sine));
     }
-    return unserved == 0;
+    return near_middle == 0;
   }
 };
 

@@ -28,7 +28,7 @@ struct quarter_turn_tangent_block : private fixed_turn_block {
       // The lowest bit says whether n is odd. Set before, it would decide ties.
       t[i] = value(bits(kept) | (bits(shifted) & 1));
     }
-    std::uint32_t out_of_range = 0;
+    loop_flag<float> out_of_range = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
       out_of_range |= mark_if<float>(is_above_fixed_turn(x[i]));
       const float v = p[i] * p[i];
@@ -48,7 +48,7 @@ struct quarter_turn_tangent_block : private fixed_turn_block {
       q[i] = static_cast<float>(denominator[i]);
     }
     for (std::int64_t i = 0; i < Length; ++i) q[i] = divide(1.0f, q[i]);
-    std::uint64_t near_middle = 0;
+    loop_flag<double> near_middle = 0;
     for (std::int64_t i = 0; i < Length; ++i) {
       const double c = q[i];
       const double quotient = numerator[i] * c;
@@ -56,7 +56,7 @@ struct quarter_turn_tangent_block : private fixed_turn_block {
       y[i] = static_cast<float>(tangent);
       near_middle |= mark_if<double>(is_near_middle(tangent));
     }
-    return (out_of_range | near_middle) == 0;
+    return out_of_range == 0 && near_middle == 0;
   }
 };
 
