@@ -11,6 +11,7 @@
 #include "scalar/log/log1p_parts.hpp"
 #include "scalar/log/reduction.hpp"
 #include "scalar/protocol.hpp"
+#include "scalar/row_lookup.hpp"
 #include "scalar/tables/dlog1p.hpp"
 #include "scalar/tables/slog1p.hpp"
 
@@ -43,31 +44,88 @@ struct log1p_s : scalar_v11<log1p_s<t>, float> {
 template <>
 struct log1p_s<tier::ha> : scalar_v11<log1p_s<tier::ha>, float> {
   LUMEN_MAIN main_result<float> main(float x) {
-    const auto one_plus = one_plus_x<float>::of(x);
-    const std::uint32_t b = bits(one_plus.sum);
-    const float m = value((b & 0x007fffffu) | 0x3b800000u);  // 2^-8
-    const float integer = rint(divide(1.0f, m));             // 128..256
-    const auto word = static_cast<std::int32_t>((bits(integer) >> 15) - 0x8600u);
-    const float scale = fma(value(0x7b000000u - (b & format<float>::special)), integer, 0.0f);
-    const auto exponent = static_cast<float>(static_cast<std::int32_t>(b >> 23));
-    // u + w is (1 + x)·scale - 1.
-    const float s = fma(one_plus.sum, scale, -1.0f);
-    const float u = fma(one_plus.error, scale, s);
-    const float w = fma(one_plus.error, scale, -(u - s));
-    const float high = fma(exponent, value(0x3f317200u), value(internal_slog1p_ha_data[word]));
-    const float low = fma(exponent, value(0x35bfbe00u), value(internal_slog1p_ha_data[word + 1]));
-    const float p = fma(value(0x3eaaab39u), u, value(0xbf000036u));
-    const float q = fma(p, fma(u, u, 0.0f), w);
-    const float sum = high + u;
-    const float e = u - (sum - high);
-    const float y = ((low + e) + q) + sum;
-    // 2^118 is the largest number whose scale is normal.
-    return {or_sign(y, x), flag_if<float>(is_outside(x, 0xbf7fffffu, 0x7a800000u))};
+    const reduced a = reduce(x);
+    const auto word = static_cast<std::int32_t>((bits(a.integer) >> 15) - 0x8600u);
+    const auto exponent = static_cast<float>(static_cast<std::int32_t>(bits(a.sum) >> 23));
+    const float high = fma(exponent, value(ln2_high), value(internal_slog1p_ha_data[word]));
+    const float low = fma(exponent, value(ln2_low), value(internal_slog1p_ha_data[word + 1]));
+    return {or_sign(logarithm(a.u, a.w, high, low), x), flag_if<float>(is_beyond_reach(x))};
   }
 
   LUMEN_RARE std::uint32_t rare(float x, float* y) {
     return breakpoint_log<log1p_path_s>(x + 1.0f, y, __slog1p_ha_CoutTab);
   }
+
+  /// The rows for all elements of a block at once.
+  template <std::int64_t Length>
+  requires wide_vectors static bool block(const float* __restrict x, float* __restrict y) {
+    float u[Length], w[Length], exponent[Length], row_high[Length], row_low[Length];
+    std::uint32_t row[Length];
+    bool unserved = false;
+    for (std::int64_t i = 0; i < Length; ++i) {
+      const reduced a = reduce(x[i]);
+      u[i] = a.u;
+      w[i] = a.w;
+      exponent[i] = static_cast<float>(static_cast<std::int32_t>(bits(a.scale) >> 23));
+      row[i] = bits(a.integer) >> 16;
+      unserved |= is_beyond_reach(x[i]);
+    }
+    if (unserved) return false;
+    row_lookup<rows_by_scale>::rows<Length>(row, row_high, row_low);
+    for (std::int64_t i = 0; i < Length; ++i) {
+      const float high = fma(exponent[i], -value(ln2_high), row_high[i]);
+      const float low = fma(exponent[i], -value(ln2_low), row_low[i]);
+      y[i] = or_sign(logarithm(u[i], w[i], high, low), x[i]);
+    }
+    return true;
+  }
+
+ private:
+  static constexpr std::uint32_t ln2_high = 0x3f317200, ln2_low = 0x35bfbe00;
+
+  /// 1 + x = 2^(exponent - 127)·m and R, an integer close to 256/m, in the place of its scale
+  /// 2^(119 - exponent)·R: u + w is (1 + x)·scale - 1.
+  struct reduced {
+    float sum;
+    float integer;
+    float scale;
+    float u;
+    float w;
+  };
+
+  LUMEN_MAIN reduced reduce(float x) {
+    const auto one_plus = one_plus_x<float>::of(x);
+    const std::uint32_t b = bits(one_plus.sum);
+    const float m = value((b & 0x007fffffu) | 0x3b800000u);  // 2^-8
+    const float integer = rint(divide(1.0f, m));             // 128..256
+    const float scale = fma(value(0x7b000000u - (b & format<float>::special)), integer, 0.0f);
+    const float s = fma(one_plus.sum, scale, -1.0f);
+    const float u = fma(one_plus.error, scale, s);
+    return {one_plus.sum, integer, scale, u, fma(one_plus.error, scale, -(u - s))};
+  }
+
+  LUMEN_MAIN float logarithm(float u, float w, float high, float low) {
+    const float p = fma(value(0x3eaaab39u), u, value(0xbf000036u));
+    const float q = fma(p, fma(u, u, 0.0f), w);
+    const float sum = high + u;
+    const float e = u - (sum - high);
+    return ((low + e) + q) + sum;
+  }
+
+  /// 2^118 is the largest number whose scale is normal.
+  LUMEN_MAIN bool is_beyond_reach(float x) { return is_outside(x, 0xbf7fffffu, 0x7a800000u); }
+
+  /// The rows R = 128..255 for the exponent field of the scale, which is 253 less that of the sum,
+  /// and one more for R = 256: 253 ln 2 is added, and the row of 256 is then that of 128. All of
+  /// this is exact.
+  static constexpr float_columns rows_by_scale = [] {
+    float_columns rows{};
+    for (int row = 0; row < 128; ++row) {
+      rows.first[row] = value(internal_slog1p_ha_data[2 * row]) + 253 * value(ln2_high);
+      rows.second[row] = value(internal_slog1p_ha_data[2 * row + 1]) + 253 * value(ln2_low);
+    }
+    return rows;
+  }();
 };
 
 /// log1p, double; log1p(±0) is ±0. Code 2 for -1, code 1 below, -infinity included, code 0 for
