@@ -114,7 +114,7 @@ TEST_P(SlowFloatBlocks, HaveTheBitsOfTheFunctorForEveryFloat) { expect_bits(1); 
 constexpr block_kernel kernels[] = {
     {"sSin", "sin_s_ha_fp64only"}, {"sCos", "cos_s_ha_fp64only"}, {"sTan", "tan_s_ha_fp64only"},
     {"sExp", "exp_s_ha_gen"},      {"sExp2", "exp2_s_ha_gen"},    {"sExp10", "exp10_s_ha_gen"},
-    {"sExpm1", "expm1_s_ha_gen"},
+    {"sExpm1", "expm1_s_ha_gen"},  {"sLog1p", "log1p_s_ha_gen"},  {"sSqrt", "sqrt_s_ha_gen"},
 };
 INSTANTIATE_TEST_SUITE_P(All, FloatBlocks, ::testing::ValuesIn(kernels),
                          [](const auto& tested) { return std::string(tested.param.name); });

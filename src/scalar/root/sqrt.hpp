@@ -4,11 +4,17 @@
 #pragma once
 
 #include <cstdint>
+#include <type_traits>
 
 #include "scalar/half.hpp"
+#include "scalar/inverse_root.hpp"
 #include "scalar/protocol.hpp"
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
+
+/// The divider of vectors of 512 bits takes twice as long for floats as the steps from an estimate.
+template <typename T>
+constexpr bool root_is_faster_by_estimate = std::is_same_v<T, float> ? wide_vectors : false;
 
 /// sqrt, float and double; correctly rounded in every tier. sqrt(-0) is -0. Code 1 for every other
 /// pattern with its sign bit set: negative numbers, -infinity, and NaNs of negative sign.
@@ -19,6 +25,22 @@ struct sqrt_body : scalar_v11<sqrt_body<T>, T> {
   LUMEN_RARE std::uint32_t rare(T x, T* y) {
     *y = sqrt(x);
     return mask(code::domain);
+  }
+
+  /// Without the divider.
+  template <std::int64_t Length>
+  requires root_is_faster_by_estimate<T>
+  static bool block(const float* __restrict x, float* __restrict y) {
+    float estimate[Length];
+    estimate_inverse_roots<Length>(x, estimate);
+    bool unserved = false;
+    for (std::int64_t i = 0; i < Length; ++i) {
+      const bool zero = x[i] == 0;
+      y[i] = select(zero, x[i], root_by_estimate(x[i], estimate[i]));
+      constexpr std::uint32_t lowest = 0x0f800000;  // 2^-96
+      unserved |= !(zero || bits(x[i]) - lowest < format<float>::special - lowest);
+    }
+    return !unserved;
   }
 };
 using sqrt_s = sqrt_body<float>;
