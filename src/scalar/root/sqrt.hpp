@@ -37,7 +37,7 @@ struct sqrt_body : scalar_v11<sqrt_body<T>, T> {
     for (std::int64_t i = 0; i < Length; ++i) {
       const bool zero = x[i] == 0;
       y[i] = select(zero, x[i], root_by_estimate(x[i], estimate[i]));
-      constexpr std::uint32_t lowest = 0x0f800000;  // 2^-96
+      constexpr std::uint32_t lowest = 0x0c800000;  // 2^-102
       unserved |= !(zero || bits(x[i]) - lowest < format<float>::special - lowest);
     }
     return !unserved;
