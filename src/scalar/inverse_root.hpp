@@ -39,8 +39,8 @@ LUMEN_MAIN float inverse_root(float y) {
 
 /// The root of x, rounded, from an estimate of 1/√x within 2^-14 of itself. One step of Newton's
 /// method for the root and the inverse leaves 2^-27 of each and the rounding; the rest to x is then
-/// exact from x = 2^-102 on, below which it is no multiple of the smallest denormal, and the last
-/// step rounds as the root does: shown for every fraction and estimates across their range.
+/// exact, from x = 2^-102 on, and the last step rounds as the root does: shown for every fraction
+/// and estimates across their range.
 LUMEN_MAIN float root_by_estimate(float x, float estimate) {
   const float s = x * estimate;
   const float h = 0.5f * estimate;

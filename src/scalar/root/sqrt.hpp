@@ -31,14 +31,17 @@ struct sqrt_body : scalar_v11<sqrt_body<T>, T> {
   template <std::int64_t Length>
   requires root_is_faster_by_estimate<T>
   static bool block(const float* __restrict x, float* __restrict y) {
-    float estimate[Length];
-    estimate_inverse_roots<Length>(x, estimate);
+    constexpr float small = 0x1p-64f;  // scaled, so that the rest to x is no denormal
+    float scaled[Length], estimate[Length];
+    for (std::int64_t i = 0; i < Length; ++i)
+      scaled[i] = select(x[i] < small, x[i] * 0x1p64f, x[i]);
+    estimate_inverse_roots<Length>(scaled, estimate);
     bool unserved = false;
     for (std::int64_t i = 0; i < Length; ++i) {
+      const float root = root_by_estimate(scaled[i], estimate[i]);
       const bool zero = x[i] == 0;
-      y[i] = select(zero, x[i], root_by_estimate(x[i], estimate[i]));
-      constexpr std::uint32_t lowest = 0x0c800000;  // 2^-102
-      unserved |= !(zero || bits(x[i]) - lowest < format<float>::special - lowest);
+      y[i] = select(zero, x[i], select(x[i] < small, root * 0x1p-32f, root));
+      unserved |= !(zero || bits(x[i]) < format<float>::special);
     }
     return !unserved;
   }
