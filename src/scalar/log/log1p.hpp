@@ -39,6 +39,22 @@ struct log1p_s : scalar_v11<log1p_s<t>, float> {
   }
 };
 
+/// ln 2 in two words as the table of `ha` has it.
+inline constexpr std::uint32_t log1p_ln2_high = 0x3f317200, log1p_ln2_low = 0x35bfbe00;
+
+/// The rows R = 128..255 of that table for the exponent field of the scale, which is 253 less that
+/// of the sum, and one more for R = 256: 253 ln 2 is added, and the row of 256 is then that of 128.
+/// All of this is exact.
+constexpr float_columns make_log1p_rows_by_scale() {
+  float_columns rows{};
+  for (int row = 0; row < 128; ++row) {
+    rows.first[row] = value(internal_slog1p_ha_data[2 * row]) + 253 * value(log1p_ln2_high);
+    rows.second[row] = value(internal_slog1p_ha_data[2 * row + 1]) + 253 * value(log1p_ln2_low);
+  }
+  return rows;
+}
+inline constexpr float_columns log1p_rows_by_scale = make_log1p_rows_by_scale();
+
 /// `ha`: a row of a table by an integer reciprocal, degree 3, and the sum in two words. Largest
 /// error 0.61 ulp.
 template <>
@@ -47,8 +63,8 @@ struct log1p_s<tier::ha> : scalar_v11<log1p_s<tier::ha>, float> {
     const reduced a = reduce(x);
     const auto word = static_cast<std::int32_t>((bits(a.integer) >> 15) - 0x8600u);
     const auto exponent = static_cast<float>(static_cast<std::int32_t>(bits(a.sum) >> 23));
-    const float high = fma(exponent, value(ln2_high), value(internal_slog1p_ha_data[word]));
-    const float low = fma(exponent, value(ln2_low), value(internal_slog1p_ha_data[word + 1]));
+    const float high = fma(exponent, value(log1p_ln2_high), value(internal_slog1p_ha_data[word]));
+    const float low = fma(exponent, value(log1p_ln2_low), value(internal_slog1p_ha_data[word + 1]));
     return {or_sign(logarithm(a.u, a.w, high, low), x), flag_if<float>(is_beyond_reach(x))};
   }
 
@@ -71,18 +87,16 @@ struct log1p_s<tier::ha> : scalar_v11<log1p_s<tier::ha>, float> {
       unserved |= is_beyond_reach(x[i]);
     }
     if (unserved) return false;
-    row_lookup<rows_by_scale>::rows<Length>(row, row_high, row_low);
+    row_lookup<log1p_rows_by_scale>::rows<Length>(row, row_high, row_low);
     for (std::int64_t i = 0; i < Length; ++i) {
-      const float high = fma(exponent[i], -value(ln2_high), row_high[i]);
-      const float low = fma(exponent[i], -value(ln2_low), row_low[i]);
+      const float high = fma(exponent[i], -value(log1p_ln2_high), row_high[i]);
+      const float low = fma(exponent[i], -value(log1p_ln2_low), row_low[i]);
       y[i] = or_sign(logarithm(u[i], w[i], high, low), x[i]);
     }
     return true;
   }
 
  private:
-  static constexpr std::uint32_t ln2_high = 0x3f317200, ln2_low = 0x35bfbe00;
-
   /// 1 + x = 2^(exponent - 127)·m and R, an integer close to 256/m, in the place of its scale
   /// 2^(119 - exponent)·R: u + w is (1 + x)·scale - 1.
   struct reduced {
@@ -114,18 +128,6 @@ struct log1p_s<tier::ha> : scalar_v11<log1p_s<tier::ha>, float> {
 
   /// 2^118 is the largest number whose scale is normal.
   LUMEN_MAIN bool is_beyond_reach(float x) { return is_outside(x, 0xbf7fffffu, 0x7a800000u); }
-
-  /// The rows R = 128..255 for the exponent field of the scale, which is 253 less that of the sum,
-  /// and one more for R = 256: 253 ln 2 is added, and the row of 256 is then that of 128. All of
-  /// this is exact.
-  static constexpr float_columns rows_by_scale = [] {
-    float_columns rows{};
-    for (int row = 0; row < 128; ++row) {
-      rows.first[row] = value(internal_slog1p_ha_data[2 * row]) + 253 * value(ln2_high);
-      rows.second[row] = value(internal_slog1p_ha_data[2 * row + 1]) + 253 * value(ln2_low);
-    }
-    return rows;
-  }();
 };
 
 /// log1p, double; log1p(±0) is ±0. Code 2 for -1, code 1 below, -infinity included, code 0 for
