@@ -17,10 +17,10 @@ REFERENCES = {"ha": ("sleef_u10",), "la": ("sleef_u10",), "ep": ("sleef_u35", "s
 HEADER = """# Speed of calls on a CPU queue
 
 Whole public calls, from the function's entry to its return, on one thread, beside the vector
-functions of SLEEF and of the C library (libmvec) in plain loops in the same run. `ha` and `la` are
+functions of SLEEF and of the C library (libmvec) in plain loops in the same runs. `ha` and `la` are
 measured by SLEEF's functions of 1 ulp, `ep` by those of 3.5 ulp where there are any: their time stands
 in nanoseconds per element, all else is the ratio of times, below 1 if the call is faster. Times are
-the least of the repetitions. Written by `scripts/bench host_calls`.
+medians of the repetitions. Written by `scripts/bench host_calls`.
 """
 
 

@@ -13,6 +13,7 @@ import sys
 from collections import defaultdict
 from dataclasses import dataclass
 from pathlib import Path
+from statistics import median
 
 REFERENCE = "sleef_u10"
 TIERS = ("ha", "la", "ep")
@@ -30,7 +31,7 @@ SLEEF and of the C library (libmvec) in the same run. SLEEF's functions of 1 ulp
 time stands in nanoseconds per element, all else is the ratio of times to theirs, below 1 if faster. A
 tier without a figure of its own has the body of the one on its left; a figure for a device without
 tables or without double stands behind a slash where that is another body; means are over the bodies that host
-kernels run, in the last column over all. Times are the least of the
+kernels run, in the last column over all. Times are medians of the
 repetitions. Written by `scripts/bench host_loop`.
 """
 
@@ -46,16 +47,19 @@ class Case:
 
 
 def times(path: Path, clock: str = "cpu_time") -> dict[Case, dict[str, float]]:
-    """Least time per element in ns, by case and implementation."""
-    found: dict[Case, dict[str, float]] = defaultdict(dict)
+    """Median time per element in ns, by case and implementation: a clock that moves between two
+    speeds gives the least of a few repetitions to whoever met its fast moments."""
+    found: dict[Case, dict[str, list[float]]] = defaultdict(lambda: defaultdict(list))
     for run in json.loads(path.read_text())["benchmarks"]:
         if run.get("run_type") == "aggregate":
             continue
         function, letter, implementation, arguments, n = run["name"].split("/")[:5]
         case = Case(function, letter, arguments, int(n))
-        time = run[clock] / case.n
-        found[case][implementation] = min(time, found[case].get(implementation, math.inf))
-    return found
+        found[case][implementation].append(run[clock] / case.n)
+    return {
+        case: {name: median(runs) for name, runs in measured.items()}
+        for case, measured in found.items()
+    }
 
 
 def bodies(measured: dict[str, float], tier: str, reduced: bool = True) -> list[float]:
