@@ -50,7 +50,8 @@ LUMEN_MAIN float root_by_estimate(float x, float estimate) {
   return fma(fma(-root, root, x), half_inverse, root);
 }
 
-/// Estimates of 1/√x within 2^-14 of themselves, for whole blocks of positive normal numbers.
+/// Estimates of 1/√x within 2^-14 of themselves, for whole blocks; of numbers that are not positive
+/// and normal they mean nothing.
 template <std::int64_t Length>
 inline void estimate_inverse_roots(const float* x, float* estimate) {
 #if defined(__AVX512F__)

@@ -25,6 +25,17 @@ std::uint32_t different_inverses(std::uint32_t first, std::uint32_t last) {
   return different;
 }
 
+/// How many of the floats have another root by steps from an estimate that is off by `error`.
+std::uint32_t different_roots(std::uint32_t first, std::uint32_t last, double error) {
+  std::uint32_t different = 0;
+  for (std::uint32_t b = first; b <= last; ++b) {
+    const float x = value(b);
+    const auto estimate = static_cast<float>((1 + error) / std::sqrt(static_cast<double>(x)));
+    different += bits(scalar::root_by_estimate(x, estimate)) != bits(std::sqrt(x));
+  }
+  return different;
+}
+
 // The steps scale with powers of 4, so that two binades stand for all.
 TEST(InverseRoot, EveryFraction) { EXPECT_EQ(different_inverses(0x3f800000, 0x407fffff), 0u); }
 
@@ -50,6 +61,19 @@ TEST(InverseRoot, BothWaysAgree) {
     ASSERT_EQ(bits(division.root), bits(steps.root)) << b;
     ASSERT_EQ(bits(division.inverse), bits(steps.inverse)) << b;
   }
+}
+
+TEST(RootByEstimate, EveryFractionFromBothEndsOfTheEstimates) {
+  for (const double error : {-0x1p-14, 0.0, 0x1p-14}) {
+    EXPECT_EQ(different_roots(0x3f800000, 0x407fffff, error), 0u) << error;
+    EXPECT_EQ(different_roots(0x1f800000, 0x1f80ffff, error), 0u) << error;  // from 2^-64
+    EXPECT_EQ(different_roots(0x7f7f0000, 0x7f7fffff, error), 0u) << error;
+  }
+}
+
+// Or the test would not see an error of the steps.
+TEST(RootByEstimate, CoarserEstimatesDoNotDo) {
+  EXPECT_NE(different_roots(0x3f800000, 0x407fffff, 0x1p-9), 0u);
 }
 
 }  // namespace

@@ -97,8 +97,8 @@ struct log1p_s<tier::ha> : scalar_v11<log1p_s<tier::ha>, float> {
   }
 
  private:
-  /// 1 + x = 2^(exponent - 127)·m and R, an integer close to 256/m, in the place of its scale
-  /// 2^(119 - exponent)·R: u + w is (1 + x)·scale - 1.
+  /// 1 + x = 2^k·m, its rounded sum and an integer R close to 256/m, with scale = 2^(-k-8)·R:
+  /// u + w is (1 + x)·scale - 1.
   struct reduced {
     float sum;
     float integer;

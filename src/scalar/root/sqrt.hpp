@@ -12,7 +12,7 @@
 
 namespace arbor::lumen::vm::detail::gpu::norvane::scalar {
 
-/// The divider of vectors of 512 bits takes twice as long for floats as the steps from an estimate.
+/// Of floats, the divider takes 12 cycles for a vector of 512 bits, the steps from an estimate 10.
 template <typename T>
 constexpr bool root_is_faster_by_estimate = std::is_same_v<T, float> ? wide_vectors : false;
 
